@@ -1,0 +1,21 @@
+# The libraries, all from the system. Their Debian packages are listed in cmake/packages.sh.
+
+find_package(PkgConfig REQUIRED)
+find_package(TBB REQUIRED)
+find_package(Boost 1.74 REQUIRED)
+find_package(CLI11 REQUIRED)
+pkg_check_modules(FFTW3F REQUIRED IMPORTED_TARGET fftw3f)
+pkg_check_modules(VIPS REQUIRED IMPORTED_TARGET vips>=8.14)
+pkg_check_modules(LCMS2 REQUIRED IMPORTED_TARGET lcms2)
+
+if(STILLMARK_TESTS)
+    find_package(GTest REQUIRED)
+endif()
+
+option(STILLMARK_BENCH "Build the benchmarks, if Google Benchmark is there" ON)
+if(STILLMARK_BENCH)
+    find_package(benchmark)
+    if(NOT benchmark_FOUND)
+        message(STATUS "No Google Benchmark: bench/ is left out")
+    endif()
+endif()
