@@ -1,11 +1,14 @@
 #pragma once
 
 #include "platform/math/complexSample.h"
+#include "platform/math/sampleMemory.h"
 
+#include <algorithm>
 #include <cassert>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <type_traits>
 
 namespace CorvaneDeblur
 {
@@ -29,10 +32,11 @@ public:
         assert(rows >= 0 && cols >= 0);
         sampleArray a;
         const std::size_t count = static_cast<std::size_t>(rows) * static_cast<std::size_t>(cols);
+        const std::size_t bytes = count * sizeof(Sample);
+        a.samples = std::shared_ptr<Sample[]>(static_cast<Sample *>(takeSampleMemory(bytes)),
+                                              [bytes](Sample *memory) { returnSampleMemory(memory, bytes); });
         if constexpr (std::is_same_v<Sample, complexSample>)
-            a.samples = std::make_shared<Sample[]>(count);
-        else
-            a.samples = std::make_shared_for_overwrite<Sample[]>(count);
+            std::fill_n(a.samples.get(), count, complexSample{0.0f, 0.0f});
         a.data = a.samples.get();
         a.rows = rows;
         a.cols = cols;

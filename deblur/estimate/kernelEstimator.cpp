@@ -218,7 +218,9 @@ floatArray kernelEstimator::seedSearch(const runPlan &plan, int seedCount)
                 bestScore = score;
             }
         }
+        // Both at once: between the two, progress would seem to fall.
         const std::lock_guard guard(lock);
+        currentLevel = level + 1;
         seedFraction = 0.0f;
     }
     if (best >= 0)

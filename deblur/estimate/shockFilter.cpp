@@ -11,12 +11,13 @@ namespace
 {
 
 /// The negative Laplacian counts only neighbours inside: in the first and last row `above` or `below` is the row
-/// itself, whose difference is 0. Sums run above, below, left, right.
+/// itself, which takes off what it adds. Sums run above, below, left, right: where an image of few levels bends by
+/// nothing, the sign is that of the rounding.
 float sharpenedSample(const float *above, const float *here, const float *below, int left, int x, int right,
                       float halfStep)
 {
     const float gx = here[right] - here[left], gy = below[x] - above[x], c = here[x];
-    const float bend = (c - above[x]) + (c - below[x]) + (c - here[left]) + (c - here[right]);
+    const float bend = 4.0f * c - (above[x] + below[x] + here[left] + here[right]);
     const float sign = static_cast<float>((bend > 0.0f) - (bend < 0.0f));
     return c + halfStep * (std::sqrt(gx * gx + gy * gy) * sign);
 }
@@ -28,7 +29,7 @@ void sharpenInside(const float *above, const float *here, const float *below, fl
     for (int x = 1; x < cols - 1; ++x)
     {
         const float gx = here[x + 1] - here[x - 1], gy = below[x] - above[x], c = here[x];
-        const float bend = (c - above[x]) + (c - below[x]) + (c - here[x - 1]) + (c - here[x + 1]);
+        const float bend = 4.0f * c - (above[x] + below[x] + here[x - 1] + here[x + 1]);
         const float magnitude = std::sqrt(gx * gx + gy * gy);
         const float signedStep = bend > 0.0f ? halfStep : (bend < 0.0f ? -halfStep : 0.0f);
         out[x] = c + signedStep * magnitude;

@@ -1,8 +1,9 @@
 #pragma once
 
+#include "platform/math/sampleMemory.h"
+
 #include <cstddef>
-#include <memory>
-#include <new>
+#include <utility>
 
 namespace CorvaneDeblur
 {
@@ -12,24 +13,29 @@ namespace CorvaneDeblur
 template <typename Sample> class alignedBuffer
 {
 public:
-    static constexpr std::align_val_t alignment{64};
-
     alignedBuffer() = default;
     explicit alignedBuffer(std::size_t sampleCount)
-        : memory(static_cast<Sample *>(::operator new(sampleCount * sizeof(Sample), alignment))), samples(sampleCount)
+        : memory(static_cast<Sample *>(takeSampleMemory(sampleCount * sizeof(Sample)))), samples(sampleCount)
     {
     }
+    alignedBuffer(alignedBuffer &&other) noexcept
+        : memory(std::exchange(other.memory, nullptr)), samples(std::exchange(other.samples, 0))
+    {
+    }
+    alignedBuffer &operator=(alignedBuffer &&other) noexcept
+    {
+        std::swap(memory, other.memory);
+        std::swap(samples, other.samples);
+        return *this;
+    }
+    ~alignedBuffer() { returnSampleMemory(memory, samples * sizeof(Sample)); }
 
-    Sample *data() const { return memory.get(); }
+    Sample *data() const { return memory; }
     std::size_t count() const { return samples; }
     Sample &operator[](std::size_t i) const { return memory[i]; }
 
 private:
-    struct release
-    {
-        void operator()(Sample *p) const { ::operator delete(p, alignment); }
-    };
-    std::unique_ptr<Sample[], release> memory;
+    Sample *memory = nullptr;
     std::size_t samples = 0;
 };
 

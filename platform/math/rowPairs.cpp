@@ -36,9 +36,8 @@ void unpackRows(const complexSample *line, float *a, float *b, int count, float 
 }
 
 // With Z the transform of a + ib, and M = Z at the mirrored frequency: A = (Z + conj M) / 2, B = (Z - conj M) / 2i.
-STILLMARK_MULTIVERSION
-static void splitPiece(const complexSample *__restrict z, const complexSample *__restrict mirror,
-                       complexSample *__restrict a, complexSample *__restrict b)
+static inline void splitPiece(const complexSample *__restrict z, const complexSample *__restrict mirror,
+                              complexSample *__restrict a, complexSample *__restrict b)
 {
     for (int j = 0; j < columnLanes; ++j)
     {
@@ -48,6 +47,7 @@ static void splitPiece(const complexSample *__restrict z, const complexSample *_
     }
 }
 
+STILLMARK_MULTIVERSION
 void splitSpectra(const complexSample *line, int cols, complexSample *halfA, complexSample *halfB,
                   std::ptrdiff_t pieceStride)
 {
@@ -75,9 +75,8 @@ void splitSpectra(const complexSample *line, int cols, complexSample *halfA, com
     }
 }
 
-STILLMARK_MULTIVERSION
-static void joinPiece(const complexSample *__restrict a, const complexSample *__restrict b, complexSample *__restrict z,
-                      complexSample *__restrict mirror)
+static inline void joinPiece(const complexSample *__restrict a, const complexSample *__restrict b,
+                             complexSample *__restrict z, complexSample *__restrict mirror)
 {
     for (int j = 0; j < columnLanes; ++j)
     {
@@ -87,6 +86,7 @@ static void joinPiece(const complexSample *__restrict a, const complexSample *__
     }
 }
 
+STILLMARK_MULTIVERSION
 void joinSpectra(const complexSample *halfA, const complexSample *halfB, std::ptrdiff_t pieceStride, int cols,
                  complexSample *line)
 {
