@@ -138,6 +138,7 @@ bool classicDeconvolver::shrinkRows(complexSample *spectrumRows, float beta)
 void classicDeconvolver::run(const floatArray &out, const floatArray &kernel, float smoothing, float suppression)
 {
     smoothWeight = 200.0f * suppression;
+    transformedGradients = 0;
     const float lambda = 1.0f / (0.02475f * smoothing * smoothing + 0.00025f);
     setUp(kernel);
     roundState round{0.0f, false, false};
@@ -149,6 +150,7 @@ void classicDeconvolver::run(const floatArray &out, const floatArray &kernel, fl
             round.gradients = shrinkRows(spectrum.data(), betas[i]);
             round.smooth = smoothWeight > 0.0f && shrinkRows(smoothSpectrum.data(), smoothBetaFactor * betas[i]);
         }
+        transformedGradients += round.gradients + round.smooth;
         round.c = betas[i] / lambda;
         solve(round);
     }

@@ -22,6 +22,9 @@ public:
 
     void run(const floatArray &out, const floatArray &kernel, float smoothing, float suppression);
 
+    /// Forward transforms of shrunk gradients in the last run: none is done where no gradient survived the shrinkage.
+    int gradientTransforms() const { return transformedGradients; }
+
 private:
     struct roundState
     {
@@ -38,6 +41,7 @@ private:
     realTransform2d grid;
     lowPassProfile lowPass;
     std::vector<float> dxPower, dyPower;
+    int transformedGradients = 0;
     float smoothWeight = 0.0f;    ///< w
     float scale;                  ///< normalises an inverse transform
     pieceSpectrum spectrum;       ///< rows of S going in, rows of X coming out

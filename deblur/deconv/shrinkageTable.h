@@ -20,7 +20,8 @@ shrinkageTable buildShrinkageTable(float beta, float alpha);
 
 /// out = table looked up at each sample of in with linear interpolation; the table's first entry belongs to `start`,
 /// neighbours lie `step` apart. The index is clamped and the end intervals are continued; NaN takes index 0. A step
-/// that is not positive fills out with the first entry. in may be out.
+/// that is not positive fills out with the first entry. in may be out. Sample by sample: the methods' own sweeps use
+/// the quicker differenceShrinker (shrinkageLookup.h).
 void applyShrinkage(const floatArray &in, const shrinkageTable &table, float start, float step, const floatArray &out);
 
 } // namespace CorvaneDeblur

@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 namespace CorvaneDeblur
 {
@@ -212,6 +213,9 @@ floatArray kernelEstimator::seedSearch(const runPlan &plan, int seedCount)
             task.score = level + 1 == seedCount ? &score : nullptr;
             if (!estimateLevel(task, candidates[i]))
                 return {};
+            // A latent image without any change along an axis has no score (0 / 0): it never beats another.
+            if (std::isnan(score))
+                score = std::numeric_limits<double>::infinity();
             if (task.score && (best < 0 || score < bestScore))
             {
                 best = static_cast<int>(i);

@@ -1,0 +1,58 @@
+#pragma once
+
+#include "cli/greyOfPhoto.h"
+#include "cli/runContext.h"
+#include "cli/traceRegion.h"
+#include "deblur/estimate/autoTraces.h"
+
+#include <memory>
+#include <utility>
+#include <vector>
+
+namespace Stillmark
+{
+
+/// Measures a photo when first asked, for the commands that need to know its noise, blur size or good regions.
+/// Throws Platform::cancelled after Ctrl-C. One thread at a time.
+class photoAnalysis
+{
+public:
+    photoAnalysis(const photo &analysed, runContext &run);
+
+    float noise();
+    rectangle noisePatch();
+
+    /// Size of the largest blur to look for: odd and no more than a third of the picture.
+    int blurSize(CorvaneDeblur::noiseMode noise);
+
+    /// Where blurs of one size may be found, best first.
+    struct regionList
+    {
+        std::vector<rectangle> regions;
+        int size = 0; ///< as asked for, or smaller if nothing was found for that
+    };
+    regionList regions(int count, int size, CorvaneDeblur::noiseMode noise);
+    /// At most one region, around a point.
+    std::vector<rectangle> regionNear(std::pair<int, int> point, int size, CorvaneDeblur::noiseMode noise);
+
+    /// Whether anything in the picture is large and strong enough to be seen after a blur of that size.
+    bool hasStructure(int size);
+
+private:
+    CorvaneDeblur::analysedImage &measured();
+
+    photo picture;
+    runContext &context;
+    greyOfPhoto source;
+    std::unique_ptr<CorvaneDeblur::analysedImage> analysis;
+};
+
+/// The same of a grey array with reduction times fewer pixels a side than the photo. What a blur of `size` has left of
+/// an edge is a slope of that length, so the array is shrunk until the blur is some 5 pixels wide; there a real edge
+/// shows as a step between neighbours, while noise has averaged out.
+bool hasStructure(const CorvaneDeblur::floatArray &grey, int size, double reduction = 1.0);
+
+/// Smallest picture whose regions can be searched; of a smaller one the whole is taken.
+constexpr int smallestSearchedSide = 160;
+
+} // namespace Stillmark

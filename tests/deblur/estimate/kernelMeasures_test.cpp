@@ -1,0 +1,86 @@
+#include "deblur/estimate/kernelMeasures.h"
+
+#include "deblur/estimate/arrayOps.h"
+#include "deblur/estimate/resample.h"
+#include "tests/support/npy.h"
+#include "tests/support/synthetic.h"
+
+#include <gtest/gtest.h>
+
+using namespace CorvaneDeblur;
+
+namespace
+{
+
+floatArray ramp(int rows, int cols, float perCol, float perRow)
+{
+    const floatArray a = floatArray::allocate(rows, cols);
+    for (int y = 0; y < rows; ++y)
+        for (int x = 0; x < cols; ++x)
+            a.at(y, x) = perCol * static_cast<float>(x) + perRow * static_cast<float>(y);
+    return a;
+}
+
+} // namespace
+
+TEST(KernelSparsity, ReferenceValuesAndTheJudgementOfThem)
+{
+    const struct
+    {
+        const char *name;
+        double sparsity;
+        bool good;
+    } cases[] = {{"impulse", 0.3333333333333333, true},
+                 {"box31", 5.567764500890887, false},
+                 {"shake15", 1.1915583721607181, true}};
+    for (const auto &c : cases)
+    {
+        const floatArray kernel = TestSupport::readFloats("sparsity", c.name);
+        EXPECT_NEAR(kernelSparsity(kernel), c.sparsity, 1e-5 * c.sparsity) << c.name;
+        EXPECT_EQ(isGoodKernel(kernel), c.good) << c.name;
+        EXPECT_EQ(kernelSparsity(TestSupport::stridedCopy(kernel)), kernelSparsity(kernel)) << c.name;
+    }
+}
+
+TEST(KernelSparsity, NothingIsNotAGoodKernel)
+{
+    const floatArray zero = floatArray::allocate(15, 15);
+    fill(zero, 0.0f);
+    EXPECT_EQ(kernelSparsity(zero), 0.0);
+    EXPECT_FALSE(isGoodKernel(zero));
+    EXPECT_EQ(kernelSparsity(floatArray{}), 0.0);
+    EXPECT_FALSE(isGoodKernel(floatArray{}));
+}
+
+TEST(KernelDistance, IgnoresScaleAndSizeButNotPlace)
+{
+    const floatArray small = TestSupport::shakeKernel(15, 15, 4);
+    const floatArray large = floatArray::allocate(31, 31);
+    resize(small, large);
+    scaleInto(large, large, 7.0f);
+    const double sameShape = kernelDistance(large, small);
+
+    const floatArray moved = floatArray::allocate(15, 15);
+    fill(moved, 0.0f);
+    copyTo(small.subRect(0, 0, 12, 12), moved.subRect(3, 3, 12, 12));
+    EXPECT_LT(sameShape, 0.1 * kernelDistance(moved, small));
+
+    // By hand: an impulse against its neighbour differs by one in two of nine samples.
+    const floatArray a = floatArray::allocate(3, 3), b = floatArray::allocate(3, 3);
+    fill(a, 0.0f);
+    fill(b, 0.0f);
+    a.at(1, 1) = 5.0f;
+    b.at(1, 2) = 1.0f;
+    EXPECT_NEAR(kernelDistance(a, b), 2.0 / 9.0, 1e-7);
+}
+
+TEST(GradientSparsity, SumOfFirstPowersOverSquares)
+{
+    // A ramp of slopes s and t gives 1/s + 1/t whatever its size.
+    EXPECT_NEAR(gradientSparsity(ramp(20, 30, 0.25f, -0.125f)), 4.0 + 8.0, 1e-6);
+    EXPECT_NEAR(gradientSparsity(ramp(7, 5, 0.25f, -0.125f)), 4.0 + 8.0, 1e-6);
+    // The last row and column lend their samples, not their own differences.
+    const floatArray image = ramp(4, 4, 0.25f, 0.125f);
+    image.at(3, 3) = 100.0f;
+    EXPECT_NEAR(gradientSparsity(image), 4.0 + 8.0, 1e-6);
+}
