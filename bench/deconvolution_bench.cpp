@@ -48,10 +48,10 @@ void cell(benchmark::State &state, deconvolutionMethod method)
         estimator->deconvolve(photo.data(), result.data(), 0, 0, cellSide, cellSide, 3, cellSide, cellSide, 8);
     };
     deconvolve();
-    const double seconds = timeJob(state, deconvolve);
+    const elapsed time = timeJob(state, deconvolve);
     // The pixels that the cell is read for; those of its margin are not counted.
-    reportPixels(state, 512.0 * 512.0, seconds);
-    floor.report(state, seconds);
+    reportPixels(state, 512.0 * 512.0, time.wall);
+    floor.report(state, time);
 }
 
 #define CELL(name) BENCHMARK_CAPTURE(cell, name, deconvolutionMethod::name)->UseManualTime()->Iterations(7)
@@ -97,11 +97,11 @@ void photo(benchmark::State &state, deconvolutionMethod method)
     {
         const stopwatch watch;
         render(method, source, result, 1);
-        record.oneThread = watch.seconds();
+        record.oneThread = watch.read().wall;
     }
 
     source.takeReads();
-    const double seconds = timeJob(state, [&] {
+    const elapsed time = timeJob(state, [&] {
         source.takeReads();
         render(method, source, result, threads);
     });
@@ -109,13 +109,13 @@ void photo(benchmark::State &state, deconvolutionMethod method)
     if (record.transforms.empty())
         record.transforms = transformsOfDeconvolution(method, source, areas, trace(), tables());
 
-    reportPixels(state, source.pixels(), seconds);
+    reportPixels(state, source.pixels(), time.wall);
     const threadLimit one(1);
-    floorRatio(record.transforms).report(state, seconds);
+    floorRatio(record.transforms).report(state, time);
     if (threads == 1)
-        record.oneThread = seconds;
+        record.oneThread = time.wall;
     else
-        state.counters["times_one_thread"] = record.oneThread / seconds;
+        state.counters["times_one_thread"] = record.oneThread / time.wall;
 }
 
 #define PHOTO(name, count)                                                                                             \

@@ -25,15 +25,15 @@ bool estimateOnce(const floatArray &image, const floatArray &kernel, int passes)
     return estimator.status() == estimateStatus::finished;
 }
 
-double timeEstimation(benchmark::State &state, const floatArray &image, int size, int passes)
+elapsed timeEstimation(benchmark::State &state, const floatArray &image, int size, int passes)
 {
     const floatArray kernel = floatArray::allocate(size, size);
     bool finished = true;
-    const double seconds = timeJob(state, [&] { finished = estimateOnce(image, kernel, passes) && finished; });
+    const elapsed time = timeJob(state, [&] { finished = estimateOnce(image, kernel, passes) && finished; });
     if (!finished)
         state.SkipWithError("the estimation failed");
-    reportPixels(state, static_cast<double>(image.rows) * image.cols, seconds);
-    return seconds;
+    reportPixels(state, static_cast<double>(image.rows) * image.cols, time.wall);
+    return time;
 }
 
 /// threads 0 is all there are.
@@ -59,7 +59,7 @@ void estimationBesideLiteral(benchmark::State &state)
     const int passes = static_cast<int>(state.range(2));
     const threadLimit one(1);
     const floatArray image = shakenScene(side, side, 1, size, seed)[0];
-    const double seconds = timeEstimation(state, image, size, passes);
+    const elapsed time = timeEstimation(state, image, size, passes);
 
     Reference::estimatorSettings settings;
     settings.sigma = 1.0f / 255.0f;
@@ -69,7 +69,7 @@ void estimationBesideLiteral(benchmark::State &state)
     fill(weights, 1.0f);
     const stopwatch watch;
     Reference::literalEstimate(settings, image, weights, kernel);
-    state.counters["times_literal"] = watch.seconds() / seconds;
+    state.counters["times_literal"] = watch.read().cpu / time.cpu;
 }
 BENCHMARK(estimationBesideLiteral)
     ->ArgNames({"side", "size", "passes"})

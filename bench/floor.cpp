@@ -19,7 +19,8 @@ namespace
 constexpr int leastRuns = 7;
 constexpr double leastSeconds = 0.03;
 
-/// Median time of one call of `timed`, each after an untimed `prepare`, once everything is warm.
+/// Median processor time of one call of `timed`, each after an untimed `prepare`, once everything is warm: on an idle
+/// machine that is the time on the wall.
 template <typename Prepare, typename Timed> double medianTime(const Prepare &prepare, const Timed &timed)
 {
     prepare();
@@ -29,9 +30,9 @@ template <typename Prepare, typename Timed> double medianTime(const Prepare &pre
     while (static_cast<int>(seconds.size()) < leastRuns || total < leastSeconds)
     {
         prepare();
-        const stopwatch watch;
+        const stopwatch watch(cpuClock::thread);
         timed();
-        seconds.push_back(watch.seconds());
+        seconds.push_back(watch.read().cpu);
         total += seconds.back();
     }
     return medianOf(std::move(seconds));

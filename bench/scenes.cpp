@@ -17,7 +17,7 @@ namespace
 {
 
 constexpr int textureSide = 256; // a power of two: the texture repeats
-constexpr float smallestLeaf = 2.0f;
+constexpr float smallestLeaf = 5.0f; // most of a photograph is smoother than its finest detail
 constexpr float coverage = 4.0f; // leaves over a pixel, on average
 
 /// Periodic 1/f noise, zero on average: octaves of a coarse grid of random values, each half as strong as the last.

@@ -45,16 +45,9 @@ struct pictures
 void reportSweep(benchmark::State &state, const pictures &p, double seconds)
 {
     const std::size_t count = static_cast<std::size_t>(p.side) * static_cast<std::size_t>(p.side);
-    std::vector<double> copies;
-    for (int i = 0; i < 9; ++i)
-    {
-        const stopwatch watch;
-        std::memcpy(p.a.data, p.in.data, count * sizeof(float));
-        benchmark::ClobberMemory();
-        copies.push_back(watch.seconds());
-    }
+    const double copy = medianCpu([&] { std::memcpy(p.a.data, p.in.data, count * sizeof(float)); });
     reportPixels(state, static_cast<double>(count), seconds);
-    state.counters["times_memcpy"] = seconds / medianOf(std::move(copies));
+    state.counters["times_memcpy"] = seconds / copy;
 }
 
 void sides(benchmark::internal::Benchmark *bench)
@@ -155,14 +148,9 @@ void sweepShrunkGradients(benchmark::State &state)
         timeLoop(state, [&] { shrunkGradientRows(grid, p.in, table, spectrum.data(), workers::one); });
     reportSweep(state, p, seconds);
 
-    std::vector<double> rows;
-    for (int i = 0; i < 9; ++i)
-    {
-        const stopwatch watch;
-        grid.forwardRows(p.in.data, p.in.stride, p.side, 0, p.side, spectrum.data());
-        rows.push_back(watch.seconds());
-    }
-    state.counters["times_rows"] = seconds / medianOf(std::move(rows));
+    const double rows =
+        medianCpu([&] { grid.forwardRows(p.in.data, p.in.stride, p.side, 0, p.side, spectrum.data()); });
+    state.counters["times_rows"] = seconds / rows;
 }
 BENCHMARK(sweepShrunkGradients)
     ->ArgNames({"side", "beta"})

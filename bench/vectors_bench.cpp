@@ -65,18 +65,14 @@ double memcpySecondsPerByte(const operands &o)
 {
     const std::size_t bytes = o.n * sizeof(float);
     const int calls = static_cast<int>(std::max<std::size_t>(1, (std::size_t{1} << 26) / bytes));
-    std::vector<double> seconds;
-    for (int i = 0; i < 9; ++i)
-    {
-        const stopwatch watch;
+    const double seconds = medianCpu([&] {
         for (int call = 0; call < calls; ++call)
         {
             std::memcpy(o.real(2), o.real(0), bytes);
             benchmark::ClobberMemory();
         }
-        seconds.push_back(watch.seconds() / calls);
-    }
-    return medianOf(std::move(seconds)) / (2.0 * static_cast<double>(bytes));
+    });
+    return seconds / calls / (2.0 * static_cast<double>(bytes));
 }
 
 void runOperation(benchmark::State &state, const operation &what)
@@ -85,7 +81,7 @@ void runOperation(benchmark::State &state, const operation &what)
     const double baseline = memcpySecondsPerByte(arrays);
     const double seconds = timeLoop(state, [&] { what.run(arrays); });
     const double bytes = static_cast<double>(arrays.n) * what.floatsMoved * sizeof(float);
-    state.counters["Melement/s"] = static_cast<double>(arrays.n) / seconds * 1e-6;
+    state.counters["elements/s"] = static_cast<double>(arrays.n) / seconds;
     state.counters["times_memcpy"] = seconds / bytes / baseline;
 }
 

@@ -5,10 +5,15 @@
 #include "cli/stopwatch.h"
 #include "cli/traceRegion.h"
 
+#include <algorithm>
+
 namespace Stillmark
 {
 namespace
 {
+
+/// Rendering leaves a picture alone where no kernel is as wide as this.
+constexpr int smallestBlur = 5;
 
 CorvaneDeblur::floatArray kernelFor(const std::string &path, const kernelSamples &kernel, const photo &picture,
                                     runContext &context)
@@ -19,8 +24,9 @@ CorvaneDeblur::floatArray kernelFor(const std::string &path, const kernelSamples
                                   ", which has " + std::to_string(picture.width()) + " x " +
                                   std::to_string(picture.height()));
     const CorvaneDeblur::floatArray square = squareKernel(toArray(kernel));
-    if (square.cols < 5)
-        context.notes.push_back(path + ": a kernel of less than 5 pixels is no blur to remove");
+    if (square.cols < smallestBlur)
+        context.notes.push_back(path + ": a kernel of less than " + std::to_string(smallestBlur) +
+                                " pixels is no blur to remove");
     return square;
 }
 
@@ -49,8 +55,10 @@ commandResult deconvolvePhoto(const deconvolveOptions &options, runContext &cont
     photoWriter result(picture, options.output);
     renderPhoto(picture, result, settings, context);
     const double seconds = rendering.seconds();
+    const bool blur = std::any_of(settings.kernels.begin(), settings.kernels.end(),
+                                  [](const auto &trace) { return trace.kernel.cols >= smallestBlur; });
     return {0,
-            "The blur was removed from " + picture.path() + ": " + options.output + " (" + secondsText(seconds) + ")",
+            options.output + (blur ? ": the blur was removed (" + secondsText(seconds) + ")" : ": the photo as it was"),
             jsonObject(
                 {{"seconds", jsonObject({{"render", jsonNumber(seconds)}})}, {"output", jsonString(options.output)}})};
 }

@@ -2,9 +2,11 @@
 #include "cli/commands.h"
 #include "cli/jsonWriter.h"
 #include "cli/kernelArrays.h"
+#include "cli/optionValues.h"
 #include "cli/photoAnalysis.h"
 #include "cli/stopwatch.h"
 #include "cli/traceEstimation.h"
+#include "deblur/estimate/kernelPyramid.h"
 
 namespace Stillmark
 {
@@ -36,6 +38,14 @@ rectangle wantedRegion(const estimateOptions &options, const photo &picture, int
     return found.regions.front();
 }
 
+void checkSkipped(const estimateOptions &options, int size)
+{
+    using namespace CorvaneDeblur;
+    if (buildPyramid(size, size, pyramidScale, pyramidMinimum, options.skipLevels).empty())
+        throw usageError("--skip-levels: " + std::to_string(options.skipLevels) + " leaves no level of a kernel of " +
+                         std::to_string(size) + " pixels");
+}
+
 std::string answerJson(const foundTrace &trace, double seconds)
 {
     return jsonObject({{"status", jsonNumber(static_cast<int>(trace.status))},
@@ -55,6 +65,7 @@ commandResult estimateKernel(const estimateOptions &options, runContext &context
     const photo picture = openPhoto(options.photo, context);
     photoAnalysis analysis(picture, context);
     const int size = options.size ? *options.size : analysis.blurSize(options.noise);
+    checkSkipped(options, size);
     const rectangle region = regionFor(picture, wantedRegion(options, picture, size, analysis, context), size);
 
     estimationSettings settings;

@@ -1,6 +1,7 @@
 #include "cli/runContext.h"
 
 #include "cli/commandLine.h"
+#include "cli/optionValues.h"
 #include "cli/stopSignal.h"
 #include "platform/error.h"
 
@@ -70,6 +71,11 @@ int runCommand(const commonOptions &options, const commandBody &body)
         bar.clear();
         stopSignal::sayCancelled();
         return exitFailed;
+    }
+    catch (const usageError &e)
+    {
+        failed(bar, "stillmark: " + std::string(e.what()));
+        return exitUsage;
     }
     catch (const std::bad_alloc &)
     {

@@ -2,7 +2,6 @@
 
 find_package(PkgConfig REQUIRED)
 find_package(TBB REQUIRED)
-find_package(Boost 1.74 REQUIRED)
 find_package(CLI11 REQUIRED)
 pkg_check_modules(FFTW3F REQUIRED IMPORTED_TARGET fftw3f)
 pkg_check_modules(VIPS REQUIRED IMPORTED_TARGET vips>=8.14)

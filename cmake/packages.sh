@@ -4,7 +4,7 @@
 # shellcheck disable=SC2034 # both lists are read by whoever sources this file
 buildPackages=(
     g++ cmake ninja-build pkg-config
-    libfftw3-dev libtbb-dev libboost-dev libpng-dev libvips-dev liblcms2-dev libcli11-dev
+    libfftw3-dev libtbb-dev libpng-dev libvips-dev liblcms2-dev libcli11-dev
 )
 # shellcheck disable=SC2034
 testPackages=(libgtest-dev libgmock-dev libbenchmark-dev clang-format)

@@ -15,7 +15,8 @@ namespace Stillmark
 /// The extension of the file name chooses the format: .jpg .jpeg (quality 95, no colour subsampling), .png, .tif .tiff
 /// (LZW or deflate), .webp (quality 95) and .pfm (floats, 0 to 1). Where a format cannot hold what the photo has,
 /// commit() converts: samples are rounded to the depth that fits, CMYK and Lab become sRGB, transparency is laid over
-/// white; notes() says so. What has been received is kept in memory up to 256 MB, in a scratch file beyond.
+/// white; notes() says so, and what metadata is lost. What has been received is kept in memory up to 256 MB, in a
+/// scratch file beyond.
 class photoWriter
 {
 public:
@@ -38,7 +39,8 @@ public:
 
     /// Saves beside the target and renames into place; may be called once, after all pixels were written
     /// (std::logic_error if some are missing). When it throws Platform::fileError or Platform::cancelled the old file
-    /// is untouched and nothing is left behind.
+    /// is untouched and nothing is left behind. Cancelling takes effect within a fraction of a second, except in WebP,
+    /// which libvips encodes in one go once it has all the pixels.
     void commit(const progressCheck &progress = {});
 
 private:

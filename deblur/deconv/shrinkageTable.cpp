@@ -75,16 +75,18 @@ double newtonMinimum(double v, double beta, double a)
 }
 
 /// Both halves of a table from a solver for v >= 0.
-template <typename Solver> shrinkageTable fillOdd(const Solver &solve)
+template <typename Solver> shrinkageTable fillOdd(const Solver &solver)
 {
     shrinkageTable table(shrinkageTableEntries);
     const auto fillRange = [&](const tbb::blocked_range<int> &range) {
-        for (int i = range.begin(); i < range.end(); ++i)
+        const Solver solve = solver;
+        float *const centre = table.data() + middle;
+        for (int i = range.begin(), end = range.end(); i < end; ++i)
         {
             const float v = static_cast<float>(i) / 100000.0f * 10.0f;
             const float w = static_cast<float>(solve(static_cast<double>(v)));
-            table[static_cast<std::size_t>(middle + i)] = w;
-            table[static_cast<std::size_t>(middle - i)] = 0.0f - w;
+            centre[i] = w;
+            centre[-i] = 0.0f - w;
         }
     };
     tbb::this_task_arena::isolate([&] { tbb::parallel_for(tbb::blocked_range<int>(0, middle + 1, 2048), fillRange); });

@@ -3,6 +3,7 @@
 #include "deblur/estimate/arrayOps.h"
 #include "deblur/estimate/resample.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace CorvaneDeblur
@@ -66,6 +67,27 @@ bool isGoodKernel(const floatArray &kernel)
 {
     const double sparsity = kernelSparsity(kernel);
     return sparsity > 0.0 && sparsity < 3.5;
+}
+
+double pointShare(const floatArray &kernel)
+{
+    double total = 0.0, most = 0.0;
+    for (int y = 0; y < kernel.rows; ++y)
+        for (int x = 0; x < kernel.cols; ++x)
+        {
+            total += std::fabs(static_cast<double>(kernel.row(y)[x]));
+            double around = 0.0;
+            for (int v = std::max(0, y - 1); v <= std::min(kernel.rows - 1, y + 1); ++v)
+                for (int u = std::max(0, x - 1); u <= std::min(kernel.cols - 1, x + 1); ++u)
+                    around += std::fabs(static_cast<double>(kernel.row(v)[u]));
+            most = std::max(most, around);
+        }
+    return total > 0.0 ? most / total : 0.0;
+}
+
+bool isPointKernel(const floatArray &kernel)
+{
+    return pointShare(kernel) >= 0.6;
 }
 
 } // namespace CorvaneDeblur

@@ -87,6 +87,12 @@ TEST_F(Program, AnswersHelpAndWrongUsage)
     EXPECT_THAT(even.err, HasSubstr("44"));
     EXPECT_EQ(even.out, "");
     EXPECT_EQ(bytesOf(folder.file("out.png")), oldOutput);
+
+    // Wrong only for the kernel's size.
+    writeGrey(folder.file("in.png"), edgeScene(200, 200, 1));
+    const programRun none = run({"estimate", "in.png", "-o", "k.pfm", "--size", "31", "--skip-levels", "30"});
+    EXPECT_EQ(none.status, 2) << none.err;
+    EXPECT_THAT(none.err, HasSubstr("--skip-levels"));
 }
 
 TEST_F(Program, RefusesFilesThatAreNoPictures)

@@ -240,6 +240,17 @@ TEST_F(Photo, FloatMapsKeepEveryValueAndOtherPagesAreMentioned)
     EXPECT_THAT(first.notes(), ElementsAre(HasSubstr("3 pictures")));
 }
 
+TEST_F(Photo, HeifIsReadWhereTheLibraryHasIt)
+{
+    const vipsImage image = noiseImage({"", "", 3, VIPS_FORMAT_UCHAR, VIPS_INTERPRETATION_sRGB}, 64, 48);
+    if (vips_heifsave(image.get(), file("p.heic").c_str(), nullptr) != 0)
+        GTEST_SKIP() << "cannot make one here: " << takeVipsError();
+    const std::string whole = bytesOf(file("p.heic"));
+    EXPECT_EQ(photo::open(file("p.heic")).width(), 64);
+    writeBytes(file("cut.heic"), whole.substr(0, whole.size() * 2 / 3));
+    EXPECT_THAT(refusal(file("cut.heic")), StartsWith(file("cut.heic") + ": "));
+}
+
 TEST_F(Photo, OpeningStopsWhenItsCallerSaysSo)
 {
     const std::string path = make({"p", ".png", 3, VIPS_FORMAT_UCHAR, VIPS_INTERPRETATION_sRGB}, 300, 900);

@@ -84,3 +84,17 @@ TEST(GradientSparsity, SumOfFirstPowersOverSquares)
     image.at(3, 3) = 100.0f;
     EXPECT_NEAR(gradientSparsity(image), 4.0 + 8.0, 1e-6);
 }
+
+TEST(PointKernel, TellsASteadyPhotoFromAShake)
+{
+    const floatArray point = floatArray::allocate(15, 15);
+    fill(point, 0.0f);
+    EXPECT_EQ(pointShare(point), 0.0);
+    point.at(0, 0) = 0.7f; // in a corner the neighbourhood is cut
+    point.at(14, 14) = 0.3f;
+    EXPECT_NEAR(pointShare(point), 0.7, 1e-7);
+    EXPECT_TRUE(isPointKernel(point));
+    for (unsigned seed = 1; seed < 6; ++seed)
+        EXPECT_FALSE(isPointKernel(TestSupport::shakeKernel(13, 13, seed)));
+    EXPECT_FALSE(isPointKernel(floatArray()));
+}
