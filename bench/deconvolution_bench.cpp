@@ -39,8 +39,7 @@ void cell(benchmark::State &state, deconvolutionMethod method)
     const threadLimit one(1);
     memoryPhoto photo(shakenScene(cellSide, cellSide, 3, kernelSize, seed));
     memoryPhoto result(cellSide, cellSide, 3);
-    const floorRatio floor(
-        transformsOfDeconvolution(method, photo, {{0, 0, cellSide, cellSide}}, trace(), tables()));
+    const floorRatio floor(transformsOfDeconvolution(method, photo, {{0, 0, cellSide, cellSide}}, trace(), tables()));
 
     const auto estimator = createLatentEstimator(method, tables());
     estimator->setKernels({trace()}, 1.0f);
@@ -54,10 +53,13 @@ void cell(benchmark::State &state, deconvolutionMethod method)
     floor.report(state, time);
 }
 
-#define CELL(name) BENCHMARK_CAPTURE(cell, name, deconvolutionMethod::name)->UseManualTime()->Iterations(7)
-CELL(wiener)->Unit(benchmark::kMillisecond);
-CELL(classic)->Unit(benchmark::kMillisecond);
-CELL(fast)->Unit(benchmark::kMillisecond);
+void cells(benchmark::internal::Benchmark *bench)
+{
+    bench->UseManualTime()->Iterations(7)->Unit(benchmark::kMillisecond);
+}
+BENCHMARK_CAPTURE(cell, wiener, deconvolutionMethod::wiener)->Apply(cells);
+BENCHMARK_CAPTURE(cell, classic, deconvolutionMethod::classic)->Apply(cells);
+BENCHMARK_CAPTURE(cell, fast, deconvolutionMethod::fast)->Apply(cells);
 
 /// 24 megapixels of three planes, blurred; made when first asked for.
 memoryPhoto &largePhoto()
@@ -118,16 +120,12 @@ void photo(benchmark::State &state, deconvolutionMethod method)
         state.counters["times_one_thread"] = record.oneThread / time.wall;
 }
 
-#define PHOTO(name, count)                                                                                             \
-    BENCHMARK_CAPTURE(photo, name, deconvolutionMethod::name)                                                          \
-        ->ArgName("threads")                                                                                           \
-        ->Arg(1)                                                                                                       \
-        ->Arg(2)                                                                                                       \
-        ->UseManualTime()                                                                                              \
-        ->Iterations(count)                                                                                            \
-        ->Unit(benchmark::kMillisecond)
-PHOTO(wiener, 3);
-PHOTO(classic, 1);
-PHOTO(fast, 1);
+void threads(benchmark::internal::Benchmark *bench)
+{
+    bench->ArgName("threads")->Arg(1)->Arg(2)->UseManualTime()->Unit(benchmark::kMillisecond);
+}
+BENCHMARK_CAPTURE(photo, wiener, deconvolutionMethod::wiener)->Apply(threads)->Iterations(3);
+BENCHMARK_CAPTURE(photo, classic, deconvolutionMethod::classic)->Apply(threads)->Iterations(1);
+BENCHMARK_CAPTURE(photo, fast, deconvolutionMethod::fast)->Apply(threads)->Iterations(1);
 
 } // namespace

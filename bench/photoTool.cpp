@@ -63,8 +63,8 @@ void makePhoto(int width, int height, const std::string &path)
 void describePhoto(const std::string &path)
 {
     const photo picture = photo::open(path);
-    const long long samples = static_cast<long long>(picture.width()) * picture.height() *
-                              (picture.colourPlanes() + picture.extraPlanes());
+    const long long samples =
+        static_cast<long long>(picture.width()) * picture.height() * (picture.colourPlanes() + picture.extraPlanes());
     std::printf("%lld\n", samples * picture.sampleBytes());
 }
 

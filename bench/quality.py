@@ -21,7 +21,10 @@ import subprocess
 import sys
 import tempfile
 
-import numpy as np
+try:
+    import numpy as np
+except ImportError:
+    sys.exit('quality.py: needs numpy for ' + sys.executable + ' (Debian: python3-numpy)')
 
 DEFAULT_BINARY = os.path.join(os.path.dirname(os.path.abspath(__file__)), '..', 'build', 'release', 'cli', 'stillmark')
 
@@ -250,7 +253,10 @@ def main():
     if not os.access(a.binary, os.X_OK):
         p.error('no program ' + a.binary)
 
-    cases = read_cases(a.data, a.group.split(',') if a.group else None)
+    try:
+        cases = read_cases(a.data, a.group.split(',') if a.group else None)
+    except (OSError, ValueError, KeyError, TypeError) as e:
+        p.error('%s holds no cases: %r' % (a.data, e))
     if not cases:
         p.error('no case with a true kernel in ' + a.data)
     score = os.path.join(a.data, 'score.py')

@@ -16,9 +16,9 @@ namespace Bench
 namespace
 {
 
-constexpr int textureSide = 256; // a power of two: the texture repeats
+constexpr int textureSide = 256;     // a power of two: the texture repeats
 constexpr float smallestLeaf = 5.0f; // most of a photograph is smoother than its finest detail
-constexpr float coverage = 4.0f; // leaves over a pixel, on average
+constexpr float coverage = 4.0f;     // leaves over a pixel, on average
 
 /// Periodic 1/f noise, zero on average: octaves of a coarse grid of random values, each half as strong as the last.
 floatArray texture(unsigned seed)
@@ -94,8 +94,8 @@ void paint(const leaf &l, const floatArray &grain, const std::vector<floatArray>
             const float dx = static_cast<float>(x) - l.x, dy = static_cast<float>(y) - l.y;
             if (!l.covers(dx, dy))
                 continue;
-            const float shade = l.slopeX * dx + l.slopeY * dy +
-                                l.grain * grain.data[(y % textureSide) * textureSide + x % textureSide];
+            const float shade =
+                l.slopeX * dx + l.slopeY * dy + l.grain * grain.data[(y % textureSide) * textureSide + x % textureSide];
             for (std::size_t p = 0; p < planes.size(); ++p)
                 planes[p].row(y)[x] = std::clamp(l.value[p % 3] + shade, 0.0f, 1.0f);
         }

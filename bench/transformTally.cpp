@@ -100,8 +100,8 @@ std::vector<transformCount> transformsOfEstimation(int imageRows, int imageCols,
         const float share = static_cast<float>(level.cols) / static_cast<float>(kernelSize);
         const int rows = std::min(scaledSize(imageRows, share), imageRows);
         const int cols = std::min(scaledSize(imageCols, share), imageCols);
-        result.push_back({fastSize(rows + level.rows - 1), fastSize(cols + level.cols - 1), 2 + 3L * passes,
-                          1 + 3L * passes});
+        result.push_back(
+            {fastSize(rows + level.rows - 1), fastSize(cols + level.cols - 1), 2 + 3L * passes, 1 + 3L * passes});
     }
     return result;
 }

@@ -23,8 +23,7 @@ void transform(benchmark::State &state, way which)
 {
     const threadLimit one(1);
     const int rows = static_cast<int>(state.range(0)), cols = static_cast<int>(state.range(1));
-    const floorSeconds fftw =
-        measureFloor({{rows, cols, which == way::there ? 1 : 0, which == way::there ? 0 : 1}});
+    const floorSeconds fftw = measureFloor({{rows, cols, which == way::there ? 1 : 0, which == way::there ? 0 : 1}});
 
     const realTransform2d grid(rows, cols, workers::one);
     const alignedBuffer<float> samples(static_cast<std::size_t>(rows) * static_cast<std::size_t>(cols));

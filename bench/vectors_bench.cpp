@@ -55,7 +55,10 @@ const operation operations[] = {
     {"sasum", 1, [](const operands &o) { benchmark::DoNotOptimize(sasum(o.n, o.real(0))); }},
     {"isamax", 1, [](const operands &o) { benchmark::DoNotOptimize(isamax(o.n, o.real(0))); }},
     {"smax", 1, [](const operands &o) { benchmark::DoNotOptimize(smax(o.n, o.real(0), 0.0f)); }},
-    {"vcMul", 6, [](const operands &o) { vcMul(o.n, o.complex(0), o.complex(1), {0.5f, 0.5f}, o.complex(2)); }},
+    {"vcMul", 6,
+     [](const operands &o) {
+         vcMul(o.n, o.complex(0), o.complex(1), {0.5f, 0.5f}, o.complex(2));
+     }},
     {"vcMulByConj", 6, [](const operands &o) { vcMulByConj(o.n, o.complex(0), o.complex(1), o.complex(2)); }},
     {"vcMulByReal", 5, [](const operands &o) { vcMulByReal(o.n, o.complex(0), o.real(1), o.complex(2)); }},
 };
