@@ -89,7 +89,7 @@ std::vector<foundTrace> findBlur(const removeOptions &options, const photo &pict
 
 bool isApplied(const foundTrace &trace, const removeOptions &options)
 {
-    return trace.good || (options.force && trace.status == estimateStatus::finished);
+    return isUsable(trace) || (options.force && trace.status == estimateStatus::finished);
 }
 
 /// Tells which traces are left out, and how to have them all the same.
@@ -97,6 +97,10 @@ void noteComplaints(const std::vector<foundTrace> &traces, const removeOptions &
 {
     for (const foundTrace &trace : traces)
     {
+        if (trace.cut && isApplied(trace, options))
+            context.notes.push_back(options.photo + ": region " + regionText(trace.region) +
+                                    ": the blur runs into the " + "border of its " + std::to_string(trace.size) +
+                                    " pixels; a larger --size may find more of it");
         const std::string complaint = complaintAbout(trace);
         if (complaint.empty())
             continue;

@@ -89,6 +89,8 @@ foundTrace estimateTrace(const photo &picture, const rectangle &region, int size
         trace.kernel = kernel;
         trace.sparsity = kernelSparsity(kernel);
         trace.good = isGoodKernel(kernel);
+        trace.point = isPointKernel(kernel);
+        trace.cut = borderShare(kernel) > 0.05;
     }
     return trace;
 }
@@ -123,6 +125,8 @@ std::string complaintAbout(const foundTrace &trace)
     switch (trace.status)
     {
     case estimateStatus::finished:
+        if (trace.point)
+            return "nothing seems to have moved: the blur found there is a point";
         return trace.good ? "" : "the blur found there is judged poor";
     case estimateStatus::imageTooSmall:
         return "it is too small for a blur of " + std::to_string(trace.size) + " pixels";

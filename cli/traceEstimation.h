@@ -28,7 +28,9 @@ struct foundTrace
     CorvaneDeblur::estimateStatus status = CorvaneDeblur::estimateStatus::finished;
     CorvaneDeblur::floatArray kernel; ///< empty unless status is finished
     double sparsity = 0;
-    bool good = false; ///< finished and not judged poor
+    bool good = false;  ///< finished and not judged poor
+    bool point = false; ///< finished, and says that nothing moved
+    bool cut = false;   ///< finished, and runs into the border of its square: the blur is longer than `size`
     int levels = 0;
 };
 
@@ -38,7 +40,13 @@ struct foundTrace
 std::vector<foundTrace> estimateTraces(const photo &picture, const std::vector<rectangle> &regions, int size,
                                        const estimationSettings &settings, runContext &context);
 
-/// Why a trace is of no use, in plain words; empty for a good one.
+/// Whether a trace is worth removing without being asked to.
+inline bool isUsable(const foundTrace &trace)
+{
+    return trace.good && !trace.point;
+}
+
+/// Why a trace is of no use, in plain words; empty for a usable one.
 std::string complaintAbout(const foundTrace &trace);
 
 } // namespace Stillmark

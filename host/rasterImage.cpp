@@ -176,7 +176,11 @@ void rasterImage::advance(const VipsRect &area)
         throw Platform::cancelled();
     drawn += static_cast<double>(area.width) * area.height / (static_cast<double>(raster.width()) * raster.height());
     if (report && !report(std::min(drawn, 1.0)))
+    {
+        // Noted under this lock, so that no other thread reports after the stop.
+        failure = std::make_exception_ptr(Platform::cancelled());
         throw Platform::cancelled();
+    }
 }
 
 } // namespace Stillmark

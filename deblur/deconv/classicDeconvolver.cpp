@@ -141,7 +141,7 @@ void classicDeconvolver::run(const floatArray &out, const floatArray &kernel, fl
     transformedGradients = 0;
     const float lambda = 1.0f / (0.02475f * smoothing * smoothing + 0.00025f);
     setUp(kernel);
-    roundState round{0.0f, false, false};
+    roundState round{0.0f, false, false, false};
     const std::vector<float> betas = splittingBetas();
     for (std::size_t i = 0; i < betas.size(); ++i)
     {
@@ -152,6 +152,7 @@ void classicDeconvolver::run(const floatArray &out, const floatArray &kernel, fl
         }
         transformedGradients += round.gradients + round.smooth;
         round.c = betas[i] / lambda;
+        round.last = i + 1 == betas.size();
         solve(round);
     }
     grid.inverseRows(spectrum.data(), 0, out.rows, out.data, out.stride, out.cols, scale);

@@ -30,6 +30,7 @@ private:
     {
         float c;                ///< beta / lambda
         bool gradients, smooth; ///< whether S and T have anything in them
+        bool last;
     };
     void setUp(const floatArray &kernel);
     void solve(const roundState &round);

@@ -138,6 +138,11 @@ void kernelEstimator::estimate(floatArray image, byteArray mask, floatArray kern
     }
     runPlan plan;
     plan.sizes = buildPyramid(kernel.cols, kernel.rows, pyramidScale, pyramidMinimum, pyramidLevel);
+    if (plan.sizes.empty())
+    {
+        fail(estimateStatus::noSeedFits);
+        return;
+    }
     plan.kernel = {kernel.cols, kernel.rows};
     plan.sigma = noiseFigure(noise, noiseLevel);
     plan.weights = floatArray::allocate(image.rows, image.cols);

@@ -17,7 +17,8 @@ enum class estimateStatus
     imageTooSmall = 1, ///< the image is smaller than imageToKernelRatio times the kernel on an axis
     noStructure = 2,   ///< no usable edges
     cancelled = 3,
-    noSeedFits = 4, ///< the seed search was asked for, but no seed has the size of a level it covers
+    noSeedFits = 4, ///< nothing to start with: no seed has the size of a level that the seed search covers, or more
+                    ///< levels are skipped than there are
 };
 
 /// The figure of the source's noise that the estimation's strengths follow.

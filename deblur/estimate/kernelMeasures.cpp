@@ -90,4 +90,18 @@ bool isPointKernel(const floatArray &kernel)
     return pointShare(kernel) >= 0.6;
 }
 
+double borderShare(const floatArray &kernel)
+{
+    double total = 0.0, border = 0.0;
+    for (int y = 0; y < kernel.rows; ++y)
+        for (int x = 0; x < kernel.cols; ++x)
+        {
+            const double weight = std::fabs(static_cast<double>(kernel.row(y)[x]));
+            total += weight;
+            if (y == 0 || x == 0 || y + 1 == kernel.rows || x + 1 == kernel.cols)
+                border += weight;
+        }
+    return total > 0.0 ? border / total : 0.0;
+}
+
 } // namespace CorvaneDeblur

@@ -22,12 +22,16 @@ double gradientSparsity(const floatArray &image);
 /// noisy kernel, the mark of an estimation that found no motion. An empty or all-zero kernel is not good.
 bool isGoodKernel(const floatArray &kernel);
 
-/// The largest share of a kernel's weight that lies in 3 x 3 samples: 1 for a point, below 0.5 for any shake that can be
-/// seen (measured on hand shakes of 13 to 51 pixels: 0.12 to 0.5). 0 for an empty or all-zero kernel.
+/// The largest share of a kernel's weight that lies in 3 x 3 samples: 1 for a point, below 0.5 for any shake that can
+/// be seen (measured on hand shakes of 13 to 51 pixels: 0.12 to 0.5). 0 for an empty or all-zero kernel.
 double pointShare(const floatArray &kernel);
 
 /// Whether a finished kernel says that nothing moved: at least 0.6 of it lies in one point and its neighbours, which is
 /// what an estimate makes of a steady photograph and its noise. To deconvolve by it would change texture only.
 bool isPointKernel(const floatArray &kernel);
+
+/// The share of a kernel's weight that lies in its outermost rows and columns. A shake that fits its square ends before
+/// them; much weight there means that the square is too small. 0 for an empty or all-zero kernel.
+double borderShare(const floatArray &kernel);
 
 } // namespace CorvaneDeblur

@@ -317,6 +317,13 @@ TEST(KernelEstimator, SeedSearchNeedsASeedOfALevelsSize)
     EXPECT_EQ(none.status(), estimateStatus::noSeedFits);
     EXPECT_TRUE(isUntouched(kernel));
 
+    kernelEstimator skipped;
+    skipped.pyramidLevel = 30;
+    kernel = filled(9, 9, untouched);
+    skipped.estimate(image, {}, kernel);
+    EXPECT_EQ(skipped.status(), estimateStatus::noSeedFits);
+    EXPECT_TRUE(isUntouched(kernel));
+
     // More levels asked for than there are, all run by the search; seeds of another shape than the level's.
     for (const auto &[rows, cols] : {std::pair(7, 7), std::pair(9, 3), std::pair(3, 3)})
     {

@@ -98,3 +98,13 @@ TEST(PointKernel, TellsASteadyPhotoFromAShake)
         EXPECT_FALSE(isPointKernel(TestSupport::shakeKernel(13, 13, seed)));
     EXPECT_FALSE(isPointKernel(floatArray()));
 }
+
+TEST(BorderShare, CountsEachOuterSampleOnce)
+{
+    const floatArray box = floatArray::allocate(5, 7);
+    fill(box, 0.5f);
+    EXPECT_NEAR(borderShare(box), 20.0 / 35.0, 1e-12);
+    box.at(2, 3) += 20.0f;
+    EXPECT_NEAR(borderShare(box), 10.0 / 37.5, 1e-7);
+    EXPECT_EQ(borderShare(floatArray()), 0.0);
+}
