@@ -12,7 +12,7 @@ std::string scratchFolder()
     const auto fromEnvironment = [](const char *name) {
         const char *value = std::getenv(name);
         const fs::path path = value ? value : "";
-        return path.is_absolute() ? path : fs::path(); // others are to be ignored (XDG Base Directory Specification)
+        return path.is_absolute() ? path : fs::path(); // others are to be ignored (XDG base directories)
     };
     fs::path cache = fromEnvironment("XDG_CACHE_HOME");
     if (cache.empty())
