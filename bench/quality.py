@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """How good kernels and results are, over a folder of pictures with known blur.
 
-  bench/quality.py --data DIR [--group G,G] [--noise low|auto] [--binary PATH] [--json]
+  bench/quality.py --data DIR [--group G,G] [--noise low|auto] [--whole] [--binary PATH] [--json]
 
 DIR/index.json lists the cases (bench/README.md has its format). Of each case with a true kernel, `stillmark estimate`
 looks for the blur in the whole picture, allowed 4 pixels more than it has; similarity is the largest normalised
@@ -189,15 +189,15 @@ def examine_kernel(program, case, noise, row):
     row['good'], row['seconds'] = answer.get('good'), answer.get('seconds')
 
 
-def examine_result(program, case, noise, score, row):
+def examine_result(program, case, noise, whole, score, row):
     out = program.path('result.png')
-    answer = program.run([case.blurred, '-o', out, '--noise', noise])
+    answer = program.run([case.blurred, '-o', out, '--noise', noise] + (['--region', case.region] if whole else []))
     row['size'] = [t.get('size') for t in answer.get('traces', [])]
     before, gain = scored_gain(score, case, out) if score else own_gain(program, case, out)
     row['psnr_blurred'], row['gain'] = round(before, 2), round(gain, 2)
 
 
-def examine(program, case, noise, score):
+def examine(program, case, noise, whole, score):
     """What is measured of a case, as a dictionary; a failure under "error"."""
     row = {'id': case.id, 'group': case.group, 'kernel_size': case.size, 'similarity': 0.0}
     errors = []
@@ -207,7 +207,7 @@ def examine(program, case, noise, score):
         errors.append(str(e))
     if case.colour and case.sharp:
         try:
-            examine_result(program, case, noise, score, row)
+            examine_result(program, case, noise, whole, score, row)
         except RunFailed as e:
             errors.append(str(e))
     if errors:
@@ -244,6 +244,8 @@ def main():
     p.add_argument('--data', required=True, help='folder with index.json')
     p.add_argument('--group', help='groups of cases, with commas (default: all with a true kernel)')
     p.add_argument('--noise', choices=['auto', 'low', 'medium', 'high'], default='auto')
+    p.add_argument('--whole', action='store_true', help='the main job, too, looks at the whole picture (default: where '
+                   'it finds a region)')
     p.add_argument('--binary', default=DEFAULT_BINARY, help='the stillmark program (default: the release build)')
     p.add_argument('--threads', type=int, default=0, help='passed on')
     p.add_argument('--own-score', action='store_true', help='do not use score.py of the folder')
@@ -270,7 +272,7 @@ def main():
         for case in cases:
             if a.kernels_only:
                 case.sharp = None
-            rows.append(examine(program, case, a.noise, score))
+            rows.append(examine(program, case, a.noise, a.whole, score))
             if not a.json:
                 print_row(rows[-1])
 
