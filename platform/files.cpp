@@ -1,5 +1,6 @@
 #include "platform/files.h"
 
+#include <algorithm>
 #include <array>
 #include <atomic>
 #include <cerrno>
@@ -226,30 +227,43 @@ void removePendingTemporaries() noexcept
             ::unlink(name.path);
 }
 
-scratchFile::scratchFile(std::uint64_t size) : length(size)
+std::string scratchFile::defaultFolder()
 {
     const char *chosen = std::getenv("TMPDIR");
-    folder = chosen && *chosen ? chosen : "/var/tmp";
-    fd = openUnnamed(folder);
+    return chosen && *chosen ? chosen : "/var/tmp";
+}
+
+scratchFile::scratchFile(const std::string &where, openTag) : folder(where), fd(openUnnamed(where))
+{
     if (fd < 0)
         throw errnoError(folder, "no scratch file can be made there", errno);
+}
+
+scratchFile::scratchFile(std::uint64_t size, const std::string &where) : scratchFile(where, openTag{})
+{
+    grow(size);
+}
+
+void scratchFile::grow(std::uint64_t size)
+{
+    // Besides being useless, setting a length of 0 makes some file systems write everything out when the file is
+    // closed.
+    if (size <= length)
+        return;
     struct statvfs disk;
-    if (::fstatvfs(fd, &disk) == 0)
+    struct stat file;
+    if (::fstatvfs(fd, &disk) == 0 && ::fstat(fd, &file) == 0)
     {
         const std::uint64_t room = static_cast<std::uint64_t>(disk.f_bavail) * disk.f_frsize;
-        if (room < size)
-        {
-            ::close(fd);
-            throw fileError(folder + ": too little room for scratch data: " + megabytes(size) + " are needed, " +
+        const std::uint64_t written = static_cast<std::uint64_t>(file.st_blocks) * 512;
+        const std::uint64_t missing = size - std::min(size, written);
+        if (room < missing)
+            throw fileError(folder + ": too little room for scratch data: " + megabytes(missing) + " are needed, " +
                             megabytes(room) + " are free (TMPDIR names another folder)");
-        }
     }
     if (::ftruncate(fd, static_cast<off_t>(size)) != 0)
-    {
-        const int code = errno;
-        ::close(fd);
-        throw errnoError(folder, "a scratch file of " + megabytes(size) + " cannot be made there", code);
-    }
+        throw errnoError(folder, "a scratch file of " + megabytes(size) + " cannot be made there", errno);
+    length = size;
 }
 
 scratchFile::~scratchFile()

@@ -58,13 +58,16 @@ private:
 /// ends the process at once. Up to 64 files at a time are known to it.
 void removePendingTemporaries() noexcept;
 
-/// An unnamed file for data that does not fit in memory, in $TMPDIR or /var/tmp (which, unlike /tmp, is not kept in
-/// memory). The system frees it when the object or the process ends, however that happens.
+/// An unnamed file for data that does not fit in memory. The system frees it when the object or the process ends,
+/// however that happens.
 class scratchFile
 {
 public:
+    /// $TMPDIR or /var/tmp (which, unlike /tmp, is not kept in memory).
+    static std::string defaultFolder();
+
     /// Room for size bytes, all zero; refused when the disk has not that much free.
-    explicit scratchFile(std::uint64_t size);
+    explicit scratchFile(std::uint64_t size, const std::string &folder = defaultFolder());
     scratchFile(const scratchFile &) = delete;
     scratchFile &operator=(const scratchFile &) = delete;
     ~scratchFile();
@@ -73,11 +76,20 @@ public:
     void read(std::uint64_t offset, void *bytes, std::size_t size) const;
     void write(std::uint64_t offset, const void *bytes, std::size_t size);
 
+    /// Makes it longer, with zeros. Refused when the disk has not enough free for all that was promised and is not
+    /// written yet; the file is as before then. Not while another thread asks for size().
+    void grow(std::uint64_t size);
+
     std::uint64_t size() const { return length; }
 
 private:
+    struct openTag
+    {
+    };
+    scratchFile(const std::string &folder, openTag);
+
     std::string folder;
-    std::uint64_t length;
+    std::uint64_t length = 0;
     int fd = -1;
 };
 

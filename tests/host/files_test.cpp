@@ -147,6 +147,14 @@ TEST_F(Files, ScratchDataIsKeptAnywhereInTheFileAndLeavesNoName)
         EXPECT_STREQ(text, "far away");
         scratch.read(2, text, 5);
         EXPECT_EQ(std::string(text, 5), std::string("\0near", 5));
+
+        scratch.grow(std::uint64_t{1} << 27);
+        EXPECT_THROW(scratch.grow(std::uint64_t{1} << 60), fileError);
+        EXPECT_EQ(scratch.size(), std::uint64_t{1} << 27);
+        scratch.read((std::uint64_t{1} << 27) - 4, text, 4);
+        EXPECT_EQ(std::string(text, 4), std::string(4, '\0'));
+        scratch.read(std::uint64_t{1} << 26, text, 8);
+        EXPECT_STREQ(text, "far away");
     }
     try
     {
