@@ -15,7 +15,7 @@ struct CTileShape
 };
 
 constexpr int tileClassCount = 16;
-/// Set in a tile specification whose low bits choose a preset: squares of 64, 128, 256, 512, 1024 pixels for 0 to 4.
+/// Set in a tile number whose low bits choose a preset: squares of 64, 128, 256, 512, 1024 pixels for 0 to 4.
 constexpr std::uint32_t tilePreset = 0x80000000u;
 
 constexpr std::size_t tileBytes(int sizeClass)
