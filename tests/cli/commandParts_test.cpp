@@ -14,8 +14,6 @@
 
 using namespace Stillmark;
 using CorvaneDeblur::floatArray;
-using testing::HasSubstr;
-using testing::Not;
 
 namespace
 {
@@ -36,12 +34,8 @@ TEST(JsonWriter, HoldsOnlyWhatJsonAllows)
               "{\"a\": [1, false], \"b\": [1, 2, 3, 4]}");
 }
 
-TEST(ProgressBar, FitsTheTerminalAndGuessesTheTimeLeft)
+TEST(ProgressBar, FitsAnyTerminal)
 {
-    EXPECT_EQ(progressBar::lineFor("Reading", 0.5, 10, 80),
-              "Reading [####################--------------------]  50%  10 s left");
-    EXPECT_THAT(progressBar::lineFor("Reading", 0.25, 100, 80), HasSubstr("5:00 min left"));
-    EXPECT_THAT(progressBar::lineFor("Reading", 0.01, 100, 80), Not(HasSubstr("left"))) << "too early to tell";
     for (int columns = 1; columns < 100; ++columns)
         for (const double done : {0.0, 0.3, 1.0})
             EXPECT_LT(static_cast<int>(progressBar::lineFor("Finding the blur", done, 9, columns).size()), columns);
@@ -85,20 +79,6 @@ TEST(HasStructure, SeesBlurredEdgesAndNoNoise)
     EXPECT_FALSE(hasStructure(flat, 31));
     const floatArray kernel = TestSupport::shakeKernel(31, 31, 2);
     EXPECT_TRUE(hasStructure(TestSupport::blurred(TestSupport::edgeScene(400, 500, 3), kernel, 0.02f, 4), 31));
-}
-
-TEST(SquareKernel, PadsAroundTheCentre)
-{
-    floatArray upright = floatArray::allocate(7, 3);
-    for (int i = 0; i < 21; ++i)
-        upright.data[i] = static_cast<float>(i);
-    const floatArray square = squareKernel(upright);
-    ASSERT_EQ(square.rows, 7);
-    ASSERT_EQ(square.cols, 7);
-    EXPECT_EQ(square.at(3, 3), upright.at(3, 1));
-    EXPECT_EQ(square.at(6, 4), upright.at(6, 2));
-    EXPECT_EQ(square.at(3, 1), 0.0f);
-    EXPECT_EQ(square.at(3, 5), 0.0f);
 }
 
 } // namespace

@@ -13,8 +13,6 @@
 
 #include <algorithm>
 #include <array>
-#include <fstream>
-#include <iterator>
 #include <stdexcept>
 #include <thread>
 
@@ -118,40 +116,6 @@ programRun runProgram(const std::filesystem::path &folder, const std::vector<std
     waitpid(child, &status, 0);
     run.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
     return run;
-}
-
-temporaryFolder::temporaryFolder()
-{
-    std::string pattern = (std::filesystem::temp_directory_path() / "stillmark-test-XXXXXX").string();
-    if (!mkdtemp(pattern.data()))
-        throw std::runtime_error("no temporary folder");
-    folder = pattern;
-}
-
-temporaryFolder::~temporaryFolder()
-{
-    std::error_code ignored;
-    std::filesystem::remove_all(folder, ignored);
-}
-
-std::vector<std::string> temporaryFolder::names() const
-{
-    std::vector<std::string> list;
-    for (const auto &entry : std::filesystem::directory_iterator(folder))
-        list.push_back(entry.path().filename().string());
-    std::sort(list.begin(), list.end());
-    return list;
-}
-
-std::string bytesOf(const std::string &path)
-{
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), {}};
-}
-
-void writeBytes(const std::string &path, const std::string &bytes)
-{
-    std::ofstream(path, std::ios::binary) << bytes;
 }
 
 void writeGrey(const std::string &path, const CorvaneDeblur::floatArray &grey)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "deblur/estimate/floatArray.h"
+#include "tests/support/temporaryFolder.h"
 
 #include <chrono>
 #include <cstdint>
@@ -30,26 +31,6 @@ struct runRules
 /// Runs the program in `folder`. A run of more than a minute is killed.
 programRun runProgram(const std::filesystem::path &folder, const std::vector<std::string> &arguments,
                       const runRules &rules = {});
-
-/// A folder of its own for a test, removed with it.
-class temporaryFolder
-{
-public:
-    temporaryFolder();
-    temporaryFolder(const temporaryFolder &) = delete;
-    temporaryFolder &operator=(const temporaryFolder &) = delete;
-    ~temporaryFolder();
-
-    const std::filesystem::path &path() const { return folder; }
-    std::string file(const std::string &name) const { return (folder / name).string(); }
-    std::vector<std::string> names() const; ///< of all that is in it, hidden or not, sorted
-
-private:
-    std::filesystem::path folder;
-};
-
-std::string bytesOf(const std::string &path);
-void writeBytes(const std::string &path, const std::string &bytes);
 
 /// A grey picture in the format that the extension names; .pfm holds the samples exactly, others 16 or 8 bits.
 void writeGrey(const std::string &path, const CorvaneDeblur::floatArray &grey);

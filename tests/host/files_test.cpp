@@ -130,13 +130,13 @@ TEST_F(Files, WholeFilesAreReadUpToALimit)
     EXPECT_EQ(readWholeFile(file("a"), 5), (std::vector<std::uint8_t>{'1', '2', '3', '4', '5'}));
     EXPECT_THROW(readWholeFile(file("a"), 4), fileError);
     EXPECT_THROW(readWholeFile(file("b"), 4), fileError);
-    EXPECT_THROW(readWholeFile(folder.string(), 1 << 30), fileError);
+    EXPECT_THROW(readWholeFile(folder.path().string(), 1 << 30), fileError);
     EXPECT_THROW(readWholeFile("/dev/zero", 1 << 30), fileError);
 }
 
 TEST_F(Files, ScratchDataIsKeptAnywhereInTheFileAndLeavesNoName)
 {
-    ::setenv("TMPDIR", folder.c_str(), 1);
+    ::setenv("TMPDIR", folder.path().c_str(), 1);
     {
         scratchFile scratch((std::uint64_t{1} << 26) + 8); // sparse: no such room is taken
         expectOnly({});
@@ -163,7 +163,7 @@ TEST_F(Files, ScratchDataIsKeptAnywhereInTheFileAndLeavesNoName)
     }
     catch (const fileError &error)
     {
-        EXPECT_THAT(error.what(), StartsWith(folder.string() + ": too little room"));
+        EXPECT_THAT(error.what(), StartsWith(folder.path().string() + ": too little room"));
     }
     ::setenv("TMPDIR", file("none").c_str(), 1);
     EXPECT_THROW(scratchFile(1), fileError);

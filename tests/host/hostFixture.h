@@ -2,9 +2,9 @@
 
 #include "host/photo.h"
 #include "host/vipsHandle.h"
+#include "tests/support/temporaryFolder.h"
 
 #include <cstdint>
-#include <filesystem>
 #include <gtest/gtest.h>
 #include <string>
 #include <vector>
@@ -28,10 +28,9 @@ void PrintTo(const pictureKind &kind, std::ostream *out);
 class hostTest : public ::testing::Test
 {
 protected:
-    hostTest();
-    ~hostTest() override;
+    hostTest() { startVips(); }
 
-    std::string file(const std::string &name) const { return (folder / name).string(); }
+    std::string file(const std::string &name) const { return folder.file(name); }
 
     /// Saves a picture of seeded noise with libvips, losslessly where the format can. Its path.
     std::string make(const pictureKind &kind, int width, int height) const;
@@ -41,14 +40,14 @@ protected:
     /// Nothing but these names is in the folder.
     void expectOnly(std::vector<std::string> names) const;
 
-    std::filesystem::path folder;
+    TestSupport::temporaryFolder folder;
 };
 
 /// Seeded noise; any bits, but floats lie between -0.5 and 1.5.
 vipsImage noiseImage(const pictureKind &kind, int width, int height);
 
-std::string bytesOf(const std::string &path);
-void writeBytes(const std::string &path, const std::string &bytes);
+using TestSupport::bytesOf;
+using TestSupport::writeBytes;
 
 /// All planes of an area, extra ones included, without gaps.
 std::vector<std::uint8_t> planesOf(const photo &picture, const rectangle &area);

@@ -1,6 +1,5 @@
 #include "deblur/deconv/extendPeriodic.h"
 
-#include "deblur/deconv/fastSize.h"
 #include "deblur/estimate/arrayOps.h"
 #include "deblur/estimate/filters.h"
 #include "tests/reference/literalExtendPeriodic.h"
@@ -22,9 +21,6 @@ TEST(ExtendPeriodic, MatchesReferenceValues)
     const floatArray out = floatArray::allocate(expected.rows, expected.cols);
     extendPeriodic(tile, out);
     EXPECT_TRUE(arrayNear(out, expected, 5e-5));
-    fill(out, -1.0f);
-    Reference::literalExtendPeriodic(tile, out);
-    EXPECT_TRUE(arrayNear(out, expected, 5e-5)) << "literal";
 }
 
 // Strips of no interior, of one row or column and of more; tiles without an interior of their own.
@@ -49,16 +45,6 @@ TEST(ExtendPeriodic, EqualsLiteralOneForAnyStrip)
             }
 }
 
-TEST(ExtendPeriodic, FlatStaysFlat)
-{
-    const floatArray tile = floatArray::allocate(20, 31), out = floatArray::allocate(35, 40);
-    const floatArray expected = floatArray::allocate(35, 40);
-    fill(tile, 0.7f);
-    fill(expected, 0.7f);
-    extendPeriodic(tile, out);
-    EXPECT_TRUE(arrayNear(out, expected, 2e-6));
-}
-
 TEST(SolveLaplace, InteriorIsHarmonicAndTheFrameStays)
 {
     for (const auto &[rows, cols] : {std::pair(3, 3), std::pair(3, 40), std::pair(40, 4), std::pair(61, 83)})
@@ -71,25 +57,6 @@ TEST(SolveLaplace, InteriorIsHarmonicAndTheFrameStays)
         copyTo(frame.subRect(1, 1, rows - 2, cols - 2), grid.subRect(1, 1, rows - 2, cols - 2));
         EXPECT_TRUE(arrayIdentical(grid, frame));
     }
-}
-
-TEST(FastSize, MatchesReferenceValues)
-{
-    const auto n = readInts("fast_size", "n"), expected = readInts("fast_size", "size");
-    ASSERT_EQ(n.size(), expected.size());
-    for (std::size_t i = 0; i < n.size(); ++i)
-        EXPECT_EQ(fastSize(static_cast<int>(n[i])), expected[i]) << n[i];
-}
-
-// Up to the table's last entry the smallest size that is not less, above it the smallest that is greater.
-TEST(FastSize, JumpsAtTheEndOfTheTable)
-{
-    EXPECT_EQ(fastSize(1), 1);
-    EXPECT_EQ(fastSize(17), 18);
-    EXPECT_EQ(fastSize(9999), 10000);
-    EXPECT_EQ(fastSize(10000), 10010);
-    EXPECT_EQ(fastSize(10001), 10010);
-    EXPECT_EQ(fastSize(10010), 10080);
 }
 
 } // namespace

@@ -1,6 +1,5 @@
 #include "deblur/deconv/latentEstimator.h"
 
-#include "deblur/deconv/latentEstimatorFastHyperLaplacian_Old.h"
 #include "deblur/deconv/shrinkageTableStore.h"
 #include "deblur/estimate/arrayOps.h"
 #include "tests/support/matchers.h"
@@ -73,14 +72,6 @@ std::vector<std::byte> run(latentEstimator &estimator, const std::vector<std::by
     return out;
 }
 
-std::vector<std::byte> someBytes(std::size_t count)
-{
-    std::vector<std::byte> bytes(count);
-    for (std::size_t i = 0; i < count; ++i)
-        bytes[i] = static_cast<std::byte>(i * 37 % 251);
-    return bytes;
-}
-
 TEST(LatentEstimator, ScalesKernelsAndRegions)
 {
     notingEstimator estimator;
@@ -89,7 +80,7 @@ TEST(LatentEstimator, ScalesKernelsAndRegions)
     latentKernel trace = traceOf(kernel, -7, 30, 101, 2147483647);
     trace.smoothing = 1.0f;
     estimator.setKernels({trace}, 0.25f);
-    run(estimator, someBytes(600), 30, 20, 1);
+    run(estimator, std::vector<std::byte>(600), 30, 20, 1);
     ASSERT_EQ(estimator.seen.size(), 1u);
     const latentKernel &seen = estimator.seen[0];
     EXPECT_EQ(seen.kernel.rows, 11);
@@ -101,26 +92,6 @@ TEST(LatentEstimator, ScalesKernelsAndRegions)
     EXPECT_EQ(estimator.gridRows, 30) << "fastSize(20 + 11 - 1)";
     EXPECT_EQ(estimator.gridCols, 36) << "fastSize(30 + 7 - 1)";
     EXPECT_TRUE(arrayIdentical(kernel, untouched)) << "the caller's kernel is its own";
-
-    estimator.setKernels({trace}, 0.001f);
-    run(estimator, someBytes(600), 30, 20, 1);
-    EXPECT_EQ(estimator.seen[1].kernel.rows, 1);
-    EXPECT_EQ(estimator.seen[1].kernel.at(0, 0), 1.0f);
-}
-
-TEST(LatentEstimator, RunsEveryPlaneOnce)
-{
-    notingEstimator estimator;
-    latentKernel trace = traceOf(constantKernel(5, 5, 1.0f), 9000, 9000, 9100, 9100); // far away, but the only one
-    trace.smoothing = 1.0f;
-    estimator.setKernels({trace}, 1.0f);
-    const std::vector<std::byte> in = someBytes(31 * 17 * 5);
-    EXPECT_TRUE(run(estimator, in, 31, 17, 5) == in);
-    EXPECT_EQ(estimator.seen.size(), 5u);
-    EXPECT_EQ(estimator.activeTraces(), std::vector<int>{0});
-
-    const std::vector<std::byte> untouched = run(estimator, in, 31, 17, 0);
-    EXPECT_EQ(std::count(untouched.begin(), untouched.end(), std::byte{0xEE}), static_cast<std::ptrdiff_t>(in.size()));
 }
 
 TEST(LatentEstimator, KernelsWithoutWeightLeaveTheRectangle)
@@ -155,23 +126,13 @@ TEST(LatentEstimator, StopsBetweenPlanesAndPassesFailuresOn)
     estimator.setStopFlag(&stop);
     estimator.setKernels({traceOf(constantKernel(5, 5, 1.0f))}, 1.0f);
     const int planes = 500;
-    run(estimator, someBytes(64 * planes), 8, 8, planes);
+    run(estimator, std::vector<std::byte>(64 * planes), 8, 8, planes);
     EXPECT_GE(estimator.seen.size(), 1u);
     EXPECT_LT(estimator.seen.size(), 300u);
 
     stop = false;
     estimator.fails = true;
-    EXPECT_THROW(run(estimator, someBytes(64), 8, 8, 1), std::bad_alloc);
-}
-
-TEST(LatentEstimator, UnknownMethodNumbersAreTheClassicOne)
-{
-    shrinkageTableStore tables("");
-    for (const int method : {1, 7, -1})
-    {
-        const auto estimator = createLatentEstimator(static_cast<deconvolutionMethod>(method), tables);
-        EXPECT_NE(dynamic_cast<latentEstimatorFastHyperLaplacian_Old *>(estimator.get()), nullptr) << method;
-    }
+    EXPECT_THROW(run(estimator, std::vector<std::byte>(64), 8, 8, 1), std::bad_alloc);
 }
 
 TEST(LatentEstimator, BlendOfThreeTracesMatchesReference)

@@ -43,13 +43,19 @@ template <typename Sample> struct planarMemory
     std::vector<std::byte> bytes;
 };
 
-template <typename Sample> void expectEveryCodeSurvives()
+template <typename Sample> class PlaneSamplesOf : public testing::Test
 {
-    const int codes = std::numeric_limits<Sample>::max() + 1;
-    planarMemory<Sample> memory(codes), copy(codes);
+};
+using sampleTypes = testing::Types<std::uint8_t, std::uint16_t>;
+TYPED_TEST_SUITE(PlaneSamplesOf, sampleTypes);
+
+TYPED_TEST(PlaneSamplesOf, EveryCodeSurvivesReadingAndWriting)
+{
+    const int codes = std::numeric_limits<TypeParam>::max() + 1;
+    planarMemory<TypeParam> memory(codes), copy(codes);
     for (int y = 0; y < memory.rows; ++y)
         for (int c = 0; c < codes; ++c)
-            memory.set(y, c, static_cast<Sample>(c));
+            memory.set(y, c, static_cast<TypeParam>(c));
 
     const floatArray plane = floatArray::allocate(memory.rows, codes);
     readPlane(memory.begin(), plane, 1, memory.pitch, memory.depth);
@@ -58,12 +64,6 @@ template <typename Sample> void expectEveryCodeSurvives()
     writePlane(plane, copy.begin(), 1, copy.pitch, copy.depth);
     // All bytes: neither the other plane nor the gaps between the rows may change.
     EXPECT_TRUE(memory.bytes == copy.bytes);
-}
-
-TEST(PlaneSamples, EveryCodeSurvivesReadingAndWriting)
-{
-    expectEveryCodeSurvives<std::uint8_t>();
-    expectEveryCodeSurvives<std::uint16_t>();
 }
 
 TEST(PlaneSamples, WritingClampsAndTruncates)

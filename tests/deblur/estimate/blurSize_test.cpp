@@ -1,7 +1,5 @@
 #include "deblur/estimate/blurSize.h"
 
-#include "deblur/estimate/arrayOps.h"
-#include "deblur/estimate/straightKernel.h"
 #include "tests/deblur/estimate/measuresImage.h"
 #include "tests/support/synthetic.h"
 
@@ -15,23 +13,6 @@ TEST(BlurSize, ReferencePicture)
 {
     const floatArray grey = TestSupport::measuresImage();
     EXPECT_EQ(blurSizeOfWindow(grey, grey.cols, grey.rows), 81);
-    EXPECT_EQ(blurSizeOfWindow(TestSupport::stridedCopy(grey), grey.cols, grey.rows), 81);
-}
-
-TEST(BlurSize, GrowsWithTheBlurAndHoldsIt)
-{
-    const floatArray scene = TestSupport::edgeScene(480, 640, 3);
-    int last = 0;
-    for (const double length : {1.0, 40.0, 80.0})
-    {
-        const floatArray window = TestSupport::blurred(scene, straightKernel(length, 0), 0.002f, 5);
-        const int size = blurSizeOfWindow(window, 3000, 2000);
-        EXPECT_EQ(size % 2, 1);
-        EXPECT_GT(size, last);
-        EXPECT_GE(size, length);
-        EXPECT_LE(size, 31 + 2 * length);
-        last = size;
-    }
 }
 
 TEST(BlurSize, WithinItsBoundsForAnyWindow)
@@ -50,27 +31,4 @@ TEST(BlurSize, WithinItsBoundsForAnyWindow)
             EXPECT_GE(blurSizeOfWindow(window, cols, rows), 31);
         }
     }
-}
-
-TEST(ConnectedExtent, FollowsEightNeighboursFromTheCentre)
-{
-    const char *const picture[] = {
-        "#.....#", //
-        ".#....#", // the diagonal reaches the centre, the right edge's bar does not
-        "..#...#", //
-        "...#...", //
-        "...#...", //
-        ".......", //
-        "#######", //
-    };
-    const floatArray a = floatArray::allocate(7, 7);
-    for (int y = 0; y < 7; ++y)
-        for (int x = 0; x < 7; ++x)
-            a.at(y, x) = picture[y][x] == '#' ? 1.0f : 0.01f; // exactly a hundredth of the peak does not count
-    const blurExtent extent = connectedExtent(a);
-    EXPECT_EQ(extent.cols, 4);
-    EXPECT_EQ(extent.rows, 5);
-
-    fill(a, 0.0f);
-    EXPECT_EQ(connectedExtent(a).cols, 1);
 }

@@ -37,17 +37,6 @@ TEST(NoiseMeasure, ReferencePicture)
     EXPECT_NEAR(noiseOfPatch(cut(grey, patch)), 0.006429506f, 6.4e-6f);
 }
 
-TEST(NoiseMeasure, FindsTheNoiseThatWasAdded)
-{
-    // The smoothest tenth of the windows lies a little below the truth.
-    for (const float sigma : {0.002f, 0.01f, 0.05f})
-    {
-        const float measured = noiseOfPatch(noisy(201, 201, 0.4f, sigma, 3));
-        EXPECT_LT(measured, 1.02f * sigma);
-        EXPECT_GT(measured, 0.88f * sigma);
-    }
-}
-
 TEST(NoiseMeasure, UnusablePatchesHaveNone)
 {
     EXPECT_EQ(noiseOfPatch(noisy(201, 201, 0.05f, 0.01f, 1)), 0.0f) << "nearly black";
@@ -62,39 +51,15 @@ TEST(NoiseMeasure, UnusablePatchesHaveNone)
     EXPECT_LT(noiseOfPatch(flat), 1e-3f) << "rounding only, never a root of a negative variance";
 }
 
-TEST(NoiseMeasure, PatchLiesWhereTheImageIsFlatAndExposed)
-{
-    // A busy picture with a smooth square, and a smoother one that is black.
-    const floatArray grey = noisy(400, 600, 0.45f, 0.15f, 5);
-    copyTo(noisy(220, 220, 0.45f, 0.01f, 6), grey.subRect(40, 300, 220, 220));
-    fill(grey.subRect(150, 20, 210, 210), 0.02f);
-    const regionRect patch = flattestPatch(grey, 600, 400);
-    EXPECT_NEAR(patch.centreX(), 410, 11);
-    EXPECT_NEAR(patch.centreY(), 150, 11);
-
-    // The same on a reduced image, in source pixels.
-    const regionRect scaled = flattestPatch(grey, 2400, 1600);
-    EXPECT_GE(scaled.x, 1200);
-    EXPECT_LE(scaled.x + scaled.width, 2080);
-    EXPECT_EQ(scaled.width, 201);
-
-    // Where all is black any place will do.
-    fill(grey, 0.0f);
-    EXPECT_EQ(flattestPatch(grey, 600, 400).width, 201);
-}
-
 TEST(NoiseMeasure, PatchStaysWithinAnyImage)
 {
-    const float bad = std::numeric_limits<float>::quiet_NaN();
-    for (const int cols : {1, 2, 10, 11, 12, 90, 300})
-    {
-        for (const int rows : {1, 2, 11, 201})
+    for (const int cols : {1, 10, 12, 300})
+        for (const int rows : {1, 11, 201})
         {
             const floatArray grey = noisy(rows, cols, 0.5f, 0.1f, 9);
-            for (const bool broken : {false, true})
+            for (const float sample : {0.5f, std::numeric_limits<float>::quiet_NaN()})
             {
-                if (broken)
-                    grey.at(rows / 2, cols / 2) = bad;
+                grey.at(rows / 2, cols / 2) = sample;
                 const regionRect patch = flattestPatch(grey, cols, rows);
                 EXPECT_FALSE(patch.empty());
                 EXPECT_TRUE(patch.x >= 0 && patch.y >= 0);
@@ -102,5 +67,4 @@ TEST(NoiseMeasure, PatchStaysWithinAnyImage)
                 EXPECT_TRUE(std::isfinite(noiseOfPatch(cut(grey, patch))));
             }
         }
-    }
 }

@@ -1,5 +1,4 @@
 #include "platform/math/sampleMemory.h"
-#include "platform/math/sineTransform.h"
 #include "platform/math/vectorOps.h"
 
 #include <gtest/gtest.h>
@@ -7,7 +6,6 @@
 #include <cmath>
 #include <cstdint>
 #include <limits>
-#include <numbers>
 #include <vector>
 
 using namespace CorvaneDeblur;
@@ -57,34 +55,6 @@ TEST(VectorOps, SumsAndSearchesTakeEveryElementOnce)
             b[at] = 5.0f;
             EXPECT_EQ(smax(n, b.data(), 1.0f), 5.0f);
         }
-    }
-}
-
-TEST(SineTransform, EqualsTheDefinitionAndIsItsOwnInverse)
-{
-    const int cols = 21, stride = 24;
-    for (const int length : {1, 2, 3, 7, 8, 58, 131})
-    {
-        std::vector<float> data(static_cast<std::size_t>(length * stride));
-        for (std::size_t i = 0; i < data.size(); ++i)
-            data[i] = std::sin(static_cast<float>(i * i % 977));
-        const std::vector<float> original = data;
-        const sineTransform transform(length);
-        transform.run(data.data(), stride, cols, 1.0f);
-        for (int k = 0; k < length; ++k)
-            for (int c = 0; c < stride; ++c)
-            {
-                double expected = 0.0;
-                for (int j = 0; j < length; ++j)
-                    expected += static_cast<double>(original[static_cast<std::size_t>(j * stride + c)]) *
-                                std::sin(std::numbers::pi * (j + 1) * (k + 1) / (length + 1));
-                if (c >= cols) // past the last column nothing is touched
-                    expected = static_cast<double>(original[static_cast<std::size_t>(k * stride + c)]);
-                ASSERT_NEAR(static_cast<double>(data[static_cast<std::size_t>(k * stride + c)]), expected, 2e-5);
-            }
-        transform.run(data.data(), stride, cols, 2.0f / static_cast<float>(length + 1));
-        for (std::size_t i = 0; i < data.size(); ++i)
-            ASSERT_NEAR(data[i], original[i], 3e-6f);
     }
 }
 
