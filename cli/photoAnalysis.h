@@ -47,11 +47,6 @@ private:
     std::unique_ptr<CorvaneDeblur::analysedImage> analysis;
 };
 
-/// The same of a grey array with reduction times fewer pixels a side than the photo. What a blur of `size` has left of
-/// an edge is a slope of that length, so the array is shrunk until the blur is some 5 pixels wide; there a real edge
-/// shows as a step between neighbours, while noise has averaged out.
-bool hasStructure(const CorvaneDeblur::floatArray &grey, int size, double reduction = 1.0);
-
 /// Smallest picture whose regions can be searched; of a smaller one the whole is taken.
 constexpr int smallestSearchedSide = 160;
 

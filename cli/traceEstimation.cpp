@@ -1,9 +1,9 @@
 #include "cli/traceEstimation.h"
 
 #include "cli/greyOfPhoto.h"
-#include "cli/photoAnalysis.h"
 #include "cli/stopSignal.h"
 #include "cli/traceRegion.h"
+#include "deblur/estimate/imageStructure.h"
 #include "deblur/estimate/kernelMeasures.h"
 #include "deblur/estimate/kernelPyramid.h"
 

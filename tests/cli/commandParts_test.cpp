@@ -1,11 +1,8 @@
 #include "cli/greyOfPhoto.h"
 #include "cli/jsonWriter.h"
 #include "cli/kernelArrays.h"
-#include "cli/photoAnalysis.h"
 #include "cli/progressBar.h"
 #include "cli/traceRegion.h"
-
-#include "tests/support/synthetic.h"
 
 #include <gmock/gmock.h>
 
@@ -13,7 +10,6 @@
 #include <limits>
 
 using namespace Stillmark;
-using CorvaneDeblur::floatArray;
 
 namespace
 {
@@ -71,14 +67,6 @@ TEST(GreyOfSamples, FollowsTheColourMode)
     EXPECT_FLOAT_EQ(grey(std::vector<float>{nan, 0.5f, 0.0f}, 32, colourMode::rgb), 0.2935f);
     EXPECT_FLOAT_EQ(grey(std::vector<float>{-std::numeric_limits<float>::infinity()}, 32, colourMode::grey), 0.0f);
     EXPECT_TRUE(std::isfinite(grey(std::vector<float>{3e38f, 3e38f, 3e38f}, 32, colourMode::rgb)));
-}
-
-TEST(HasStructure, SeesBlurredEdgesAndNoNoise)
-{
-    const floatArray flat = TestSupport::noiseImage(400, 500, 1, 0.5f - 0.02f, 0.5f + 0.02f);
-    EXPECT_FALSE(hasStructure(flat, 31));
-    const floatArray kernel = TestSupport::shakeKernel(31, 31, 2);
-    EXPECT_TRUE(hasStructure(TestSupport::blurred(TestSupport::edgeScene(400, 500, 3), kernel, 0.02f, 4), 31));
 }
 
 } // namespace
