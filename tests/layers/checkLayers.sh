@@ -26,11 +26,11 @@ function rowOf(path) {
 
 function within(folder, above) { return folder == above || index(folder, above "/") == 1 }
 
-function mayInclude(from, to,    list, n, i) {
+function mayInclude(from, to, header,    list, n, i) {
     if (within(to, from)) return 1
     n = split(allowed[from], list, " ")
     for (i = 1; i <= n; i++)
-        if (list[i] == "*" || within(to, list[i])) return 1
+        if (list[i] == "*" || within(to, list[i]) || header == list[i]) return 1
     return 0
 }
 
@@ -73,7 +73,7 @@ row != "" && /^[ \t]*#[ \t]*include[ \t]*["<]/ {
     if (to == "") {
         if (quoted) complain("\"" header "\" is not written from the project root")
         else checkOutside(folder, header)
-    } else if (!mayInclude(row, target))
+    } else if (!mayInclude(row, target, header))
         complain(row " may not include " header)
 }
 

@@ -34,6 +34,9 @@ expect()
 
 expect 0 '' deblur/deconv/render.cpp '#include "deblur/estimate/array.h"'
 expect 0 '' tests/host/photo_test.cpp '#include "host/photo.h"'
+expect 0 '' host/plugin/run.h '#include "shell/tintorel.h"'
+expect 1 'host may not include shell/virtualHeap.h' host/plugin/bad.h '#include "shell/virtualHeap.h"'
+expect 1 'deblur may not include shell/tintorel.h' deblur/estimate/bad.h '#include "shell/tintorel.h"'
 expect 1 'deblur/estimate/bad.cpp:2: deblur may not include host/photo.h' deblur/estimate/bad.cpp '#include "host/photo.h"'
 expect 1 'platform may not include deblur' platform/bad.h '  #  include "deblur/estimate/array.h" // why not'
 expect 1 'platform/math may not include platform/files.h' platform/math/bad.cpp '#include "platform/files.h"'
