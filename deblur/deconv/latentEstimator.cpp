@@ -1,5 +1,6 @@
 #include "deblur/deconv/latentEstimator.h"
 
+#include "deblur/deconv/alignKernels.h"
 #include "deblur/deconv/extendPeriodic.h"
 #include "deblur/deconv/fastSize.h"
 #include "deblur/deconv/planeSamples.h"
@@ -14,6 +15,7 @@
 #include <cassert>
 #include <cmath>
 #include <cstring>
+#include <iterator>
 
 namespace CorvaneDeblur
 {
@@ -65,6 +67,13 @@ void copyPlane(const std::byte *source, std::byte *destination, int plane, int r
 void latentEstimator::setKernels(const std::vector<latentKernel> &traces, float scale)
 {
     kernels = traces;
+    // A common position of the estimated kernels is worked out, and leaves with the list: what is rendered with are the
+    // traces' own kernels, where they sit.
+    std::vector<latentKernel> estimated;
+    std::copy_if(traces.begin(), traces.end(), std::back_inserter(estimated),
+                 [](const latentKernel &trace) { return !trace.isManual; });
+    if (estimated.size() > 1)
+        alignKernels(estimated);
     for (latentKernel &trace : kernels)
     {
         trace.kernel = scaledKernel(trace.kernel, scale);

@@ -15,7 +15,7 @@ struct latentKernel
     int regionBottom = 0;
     float smoothing = 0.3f;   ///< 0 sharp and noisy .. 1 smooth
     float suppression = 0.3f; ///< 0 .. 1: pull towards the blurred input against ringing
-    bool isManual = false;
+    bool isManual = false;    ///< drawn by hand: takes no part in alignKernels
 };
 
 } // namespace CorvaneDeblur

@@ -1,0 +1,38 @@
+#include "stages/source.h"
+
+#include "stages/imageHub.h"
+
+namespace Project
+{
+
+using Sarnik::CMemoryPixmap;
+using Sarnik::CRect;
+
+void PSource::SetBounds(const CRect &newRect)
+{
+    const PPlaneLayout layout = hub.Layout();
+    if (newRect == Rect() && HasPixmap())
+        return;
+    Reset(); // moved pixels would be those of another place
+    Place(newRect, layout.depth, layout.SourcePlanes());
+}
+
+std::uint64_t PSource::ProcessCell(std::int64_t column, std::int64_t row, bool)
+{
+    if (CellRemaining(column, row) == 0)
+        return 0;
+    const CRect cell = TileRect(column, row).Intersected(Rect());
+    if (!cell.Empty())
+    {
+        const PPlaneLayout layout = hub.Layout();
+        CMemoryPixmap pixels(cell, layout.depth, layout.SourcePlanes());
+        hub.Host().ReadSource(pixels);
+        if (layout.selection)
+            hub.Host().ReadSelection(pixels, layout.SelectionPlane());
+        copyPlanes(Pixmap(), 0, pixels, 0, layout.SourcePlanes(), cell);
+    }
+    ++State(column, row);
+    return 1;
+}
+
+} // namespace Project
