@@ -22,7 +22,7 @@ bufferTable &self(void *context)
 
 std::uint64_t mostHostMemory()
 {
-    const std::uint64_t memory = Platform::physicalMemory();
+    static const std::uint64_t memory = Platform::physicalMemory();
     return memory > 0 ? memory : std::uint64_t{1} << 32;
 }
 

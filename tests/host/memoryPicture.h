@@ -32,6 +32,7 @@ public:
     TNPoint32 imageSize() const override { return size; }
     TNRect32 filterRect() const override { return rect; }
     const TNDocument *document() const override { return &shown; }
+    void watchAutoMask(const std::uint8_t *place) override { autoMask = place; }
 
     TNError readPixels(TNPort port, const TNRect32 &area, const TNPixelMemory &to) override
     {
@@ -49,6 +50,7 @@ public:
     TNRect32 rect;
     TNDocument shown{};
     TNChannel channel{};
+    const std::uint8_t *autoMask = nullptr;
     std::function<void()> onPixels; ///< before each read and write
 
 private:

@@ -144,7 +144,9 @@ TEST_F(PluginHost, GivesAPluginAllThatItNeedsAndTakesItsResult)
         EXPECT_EQ(total, rows);
         lastDone = done;
     };
+    picture.onPixels = [&] { EXPECT_TRUE(picture.autoMask && *picture.autoMask == 1); };
     const hostOutcome outcome = run(taskInvert);
+    EXPECT_EQ(picture.autoMask, nullptr); // its place has gone
     EXPECT_TRUE(outcome.done()) << outcome.result;
     EXPECT_TRUE(outcome.wrote);
     EXPECT_EQ(picture.samples, inverted(before));

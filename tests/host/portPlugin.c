@@ -184,15 +184,34 @@ static TNError readOnce(const TNFilterBlock *block, int32_t width, int32_t colum
     return block->readPixels(block->pixelContext, channel->readPort, &area, &memory);
 }
 
-static void *readOnThread(void *block)
+struct onThread
 {
-    readOnce(block, 1, 8);
+    const TNFilterBlock *block;
+    const TNColorSpaceSuite *colours;
+    TNError converted;
+};
+
+static void *readAndConvert(void *context)
+{
+    struct onThread *work = context;
+    uint16_t quad[4] = {1, 2, 3, 4};
+    readOnce(work->block, 1, 8);
+    work->converted = work->colours->cmykToRgb16(work->colours->context, quad, 1);
     return NULL;
+}
+
+static TNError useThread(const TNFilterBlock *block)
+{
+    struct onThread work = {block, acquire(block, TN_COLOR_SPACE_SUITE, 2), TNErrParameter};
+    pthread_t thread;
+    pthread_create(&thread, NULL, readAndConvert, &work);
+    pthread_join(thread, NULL);
+    release(block, TN_COLOR_SPACE_SUITE, 2, work.colours);
+    return work.converted;
 }
 
 static TNError start(TNFilterBlock *block, intptr_t task)
 {
-    pthread_t thread;
     switch (task)
     {
     case taskInvert:
@@ -211,9 +230,7 @@ static TNError start(TNFilterBlock *block, intptr_t task)
         readOnce(block, 0, 8);
         return readOnce(block, 1, 7);
     case taskBadThread:
-        pthread_create(&thread, NULL, readOnThread, block);
-        pthread_join(thread, NULL);
-        return TNNoError;
+        return useThread(block);
     case taskBadHandleRecorded:
         block->descriptor->descriptor = (TNHandle)(void *)block;
         return TNNoError;

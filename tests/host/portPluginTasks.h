@@ -15,7 +15,7 @@ enum portPluginTask
     taskLeak,    /* Start gives nothing back */
     taskTwice,   /* Start gives everything back twice */
     taskBadRead, /* reads with an empty rectangle, then with strides that hold no samples */
-    taskBadThread, /* reads on a thread of its own */
+    taskBadThread, /* reads, and converts a colour, on a thread of its own */
     taskNoResult,
     taskBadHandleRecorded, /* leaves an address that is no handle in the slot */
     taskJunkRecorded,      /* leaves a handle of junk in the slot */
