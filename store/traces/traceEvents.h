@@ -74,6 +74,12 @@ public:
     /// A number that differs for any two states of the undo stack, 0 when it is empty.
     virtual std::uintptr_t UndoPosition() const { return 0; }
 
+    /// A trace from a file is about to enter the list: whoever records inserts a copy of it as an undoable step. False
+    /// where nobody does; the loader inserts it itself then.
+    virtual bool AddLoadedTrace(const PKernel &, int /*at*/) { return false; }
+    /// A workspace has replaced all traces: nothing can be undone any more.
+    virtual void WorkspaceLoaded() {}
+
     /// Several previews are shown side by side; nothing counts as selected meanwhile.
     virtual bool MultiPreview() const { return false; }
     /// Waits for what renders the traces' previews on another thread, before the list changes.
