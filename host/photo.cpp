@@ -2,6 +2,7 @@
 
 #include "host/pfm.h"
 #include "host/photoContent.h"
+#include "host/photoMetadata.h"
 #include "platform/files.h"
 
 #include <algorithm>
@@ -98,6 +99,11 @@ const std::string &photo::path() const
 const std::vector<std::string> &photo::notes() const
 {
     return opened->notes;
+}
+
+std::vector<std::uint8_t> photo::profile() const
+{
+    return profileOf(opened->metadata.get());
 }
 
 void photo::read(const rectangle &area, void *planar, std::size_t rowBytes) const

@@ -3,6 +3,7 @@
 #include "platform/error.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <string>
@@ -59,6 +60,9 @@ public:
     int extraPlanes() const;  ///< planes after the colours: transparency, then further masks; all pass unchanged
     bool hasTransparency() const { return extraPlanes() > 0; }
     const std::string &path() const;
+
+    /// The embedded ICC profile as it stands in the file, which may be anything; empty if there is none.
+    std::vector<std::uint8_t> profile() const;
 
     /// Sentences for the user about what opening could not keep, such as further pages.
     const std::vector<std::string> &notes() const;

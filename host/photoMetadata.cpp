@@ -74,6 +74,12 @@ void copyMetadata(VipsImage *from, VipsImage *to)
     to->Yres = from->Yres;
 }
 
+std::vector<std::uint8_t> profileOf(VipsImage *metadata)
+{
+    const std::string_view bytes = blobOf(metadata, VIPS_META_ICC_NAME);
+    return {bytes.begin(), bytes.end()};
+}
+
 void adaptMetadata(VipsImage *picture, photoFormat::kind format)
 {
     if (format == photoFormat::kind::png)

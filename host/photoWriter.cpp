@@ -69,6 +69,26 @@ void photoWriter::write(const rectangle &area, const void *planar, std::size_t r
     s->pixelsWritten += static_cast<std::uint64_t>(area.width) * static_cast<std::uint64_t>(area.height);
 }
 
+void photoWriter::takeModelPixels()
+{
+    const sampleRaster &model = *s->model->raster;
+    const int width = model.width(), rowsAtOnce = model.bandRows(width);
+    const std::size_t rowBytes = static_cast<std::size_t>(width) * model.pixelBytes();
+    std::vector<std::uint8_t> band(rowBytes * static_cast<std::size_t>(rowsAtOnce));
+    for (int y = 0; y < model.height(); y += rowsAtOnce)
+    {
+        const rectangle rows{0, y, width, std::min(rowsAtOnce, model.height() - y)};
+        model.read(rows, band.data(), rowBytes);
+        s->raster.write(rows, band.data(), rowBytes);
+    }
+    s->pixelsWritten = static_cast<std::uint64_t>(width) * static_cast<std::uint64_t>(model.height());
+}
+
+void photoWriter::replacePlane(int plane, const rectangle &area, const void *samples, std::size_t rowBytes)
+{
+    s->raster.writePlane(area, plane, samples, rowBytes);
+}
+
 void photoWriter::commit(const progressCheck &progress)
 {
     if (s->pixelsWritten != static_cast<std::uint64_t>(s->raster.width()) * s->raster.height())

@@ -10,7 +10,8 @@ namespace Stillmark
 {
 
 /// Receives a result rectangle by rectangle and saves it as a new version of a photo: same size, depth, colour mode,
-/// profile, EXIF (orientation included), XMP, IPTC, resolution, and the model's transparency untouched.
+/// profile, EXIF (orientation included), XMP, IPTC, resolution, and, where it is not replaced, the model's
+/// transparency.
 ///
 /// The extension of the file name chooses the format: .jpg .jpeg (quality 95, no colour subsampling), .png, .tif .tiff
 /// (LZW or deflate), .webp (quality 95) and .pfm (floats, 0 to 1). Where a format cannot hold what the photo has,
@@ -36,6 +37,11 @@ public:
     /// Takes the colour planes of area, laid out as photo::read gives them. Every pixel is to be written exactly once,
     /// in any order; several threads may write at once.
     void write(const rectangle &area, const void *planar, std::size_t rowBytes);
+
+    /// Another way to fill a result: takes all pixels from the model, after which planes of it, extra ones too, may be
+    /// replaced, in any order and again. One thread at a time; not together with write.
+    void takeModelPixels();
+    void replacePlane(int plane, const rectangle &area, const void *samples, std::size_t rowBytes);
 
     /// Saves beside the target and renames into place; may be called once, after all pixels were written
     /// (std::logic_error if some are missing). When it throws Platform::fileError or Platform::cancelled the old file

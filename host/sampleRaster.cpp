@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cassert>
 #include <cstring>
+#include <vector>
 
 namespace Stillmark
 {
@@ -86,6 +87,26 @@ void sampleRaster::write(const rectangle &area, const void *pixels, std::size_t 
             std::memcpy(memory.get() + offset(area.x, area.y + y), from, length);
         else
             disk->write(offset(area.x, area.y + y), from, length);
+}
+
+void sampleRaster::writePlane(const rectangle &area, int plane, const void *samples, std::size_t rowBytes)
+{
+    assert(area.x >= 0 && area.y >= 0 && area.x + area.width <= columns && area.y + area.height <= rows);
+    assert(plane >= 0 && plane < planeCount);
+    const auto *from = static_cast<const std::uint8_t *>(samples);
+    const std::size_t length = static_cast<std::size_t>(area.width) * pixelBytes();
+    const int rowsAtOnce = memory ? 1 : std::min(bandRows(area.width), area.height);
+    std::vector<std::uint8_t> band(memory ? 0 : length * static_cast<std::size_t>(rowsAtOnce));
+    for (int y = 0; y < area.height; y += rowsAtOnce, from += rowBytes * static_cast<std::size_t>(rowsAtOnce))
+    {
+        const rectangle part{area.x, area.y + y, area.width, std::min(rowsAtOnce, area.height - y)};
+        if (!memory)
+            read(part, band.data(), length);
+        std::uint8_t *pixels = memory ? memory.get() + offset(part.x, part.y) : band.data();
+        planeToPixels(from, rowBytes, part.width, part.height, planeCount, bytesPerSample, plane, pixels);
+        if (!memory)
+            write(part, band.data(), length);
+    }
 }
 
 void pixelsToPlane(const void *pixels, int width, int height, int pixelPlanes, int sampleBytes, int plane,

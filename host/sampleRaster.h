@@ -33,6 +33,9 @@ public:
     void read(const rectangle &area, void *pixels, std::size_t rowBytes) const;
     void write(const rectangle &area, const void *pixels, std::size_t rowBytes);
 
+    /// One plane of area, packed rows rowBytes apart; the others stay. Every pixel of it must have been written before.
+    void writePlane(const rectangle &area, int plane, const void *samples, std::size_t rowBytes);
+
 private:
     std::uint64_t offset(int x, int y) const;
 
