@@ -66,10 +66,10 @@ void WriteChunk(Sarnik::CContainer &out, std::uint32_t type, std::uint32_t versi
 
 } // namespace
 
-void ReadPreferences(Sarnik::CContainer &in, PPreferences &preferences)
+bool ReadPreferences(Sarnik::CContainer &in, PPreferences &preferences)
 {
     if (!ReadFileHeader(in))
-        return;
+        return false;
     // Lengths are added up in 64 bits: one that wraps around would lead back to a chunk already read, for ever.
     for (std::uint64_t next = kHeaderLength; const std::uint32_t creator = in.ReadU32();)
     {
@@ -81,6 +81,7 @@ void ReadPreferences(Sarnik::CContainer &in, PPreferences &preferences)
             ReadChunk(in, type, version, preferences);
         in.Seek(next);
     }
+    return true;
 }
 
 void WritePreferences(Sarnik::CContainer &out, const PPreferences &preferences)

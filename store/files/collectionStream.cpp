@@ -59,8 +59,9 @@ void WriteCollection(const PKernelCollection &collection, Sarnik::CContainer &ou
     if (lone)
     {
         lone->Write(out);
-        out.WriteU32(1);
-        out.WriteU32(0);
+        out.WriteU32(static_cast<std::uint32_t>(collection.ActiveCount()));
+        if (collection.ActiveCount() != 0)
+            out.WriteU32(0);
     }
     else
     {

@@ -24,8 +24,8 @@ struct PStreamIndices
 };
 
 /// The whole list in the newest version; the activated traces in the list's order. A run that found its one trace by
-/// itself, without a dialog, has it beside an empty list: it is written as the list's only trace, activated, so that
-/// whoever reads the record of such a run learns what was found. (Playing the record searches anew.)
+/// itself, without a dialog, has it beside an empty list: it is written as the list's only trace, activated if it
+/// renders, so that whoever reads the record of such a run learns what was found. (Playing the record searches anew.)
 void WriteCollection(const PKernelCollection &collection, Sarnik::CContainer &out);
 
 /// Empties the collection and fills it from the stream, by the rules of the collection's version. Traces that the

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstddef>
+
 namespace Sarnik
 {
 class CContainer;
@@ -10,6 +12,8 @@ namespace Project
 {
 
 class PKernelCollection;
+
+inline constexpr std::size_t kHeaderLength = 18;
 
 /// The newest version, and the size of the collection's picture.
 void WriteHeader(const PKernelCollection &collection, Sarnik::CContainer &out);
