@@ -127,9 +127,8 @@ void photo::readPlanes(const rectangle &area, int firstPlane, int planes, void *
         const int rows = std::min(bandRows, area.height - y);
         raster.read({area.x, area.y + y, area.width, rows}, band.data(), rowLength);
         auto *to = static_cast<std::uint8_t *>(planar) + static_cast<std::size_t>(y) * rowBytes;
-        for (int p = 0; p < planes; ++p, to += planeBytes)
-            pixelsToPlane(band.data(), area.width, rows, raster.planes(), raster.sampleBytes(), firstPlane + p, to,
-                          rowBytes);
+        pixelsToPlanes(band.data(), area.width, rows, raster.planes(), raster.sampleBytes(), firstPlane, planes, to,
+                       rowBytes, planeBytes);
     }
 }
 

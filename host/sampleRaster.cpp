@@ -1,8 +1,11 @@
 #include "host/sampleRaster.h"
 
+#include "platform/math/multiversion.h"
+
 #include <algorithm>
 #include <cassert>
 #include <cstring>
+#include <type_traits>
 #include <vector>
 
 namespace Stillmark
@@ -11,31 +14,53 @@ namespace Stillmark
 namespace
 {
 
-template <typename Sample>
-void gather(const void *pixels, int width, int height, int pixelPlanes, int plane, void *samples, std::size_t rowBytes)
+/// Calls use with a sample of the size, and the number of planes known to the compiler where it is a common one.
+template <typename Use> void withShape(int sampleBytes, int pixelPlanes, const Use &use)
 {
-    const auto *from = static_cast<const Sample *>(pixels) + plane;
-    auto *row = static_cast<std::uint8_t *>(samples);
-    for (int y = 0; y < height; ++y, row += rowBytes)
+    const auto withPlanes = [&](auto sample) {
+        switch (pixelPlanes)
+        {
+        case 1:
+            return use(sample, std::integral_constant<int, 1>());
+        case 3:
+            return use(sample, std::integral_constant<int, 3>());
+        case 4:
+            return use(sample, std::integral_constant<int, 4>());
+        default:
+            return use(sample, pixelPlanes);
+        }
+    };
+    if (sampleBytes == 1)
+        withPlanes(std::uint8_t());
+    else if (sampleBytes == 2)
+        withPlanes(std::uint16_t());
+    else
+        withPlanes(std::uint32_t());
+}
+
+/// Three planes of a row at once: the compiler makes shuffles of it.
+template <typename Sample>
+inline void splitThree(std::size_t n, const Sample *from, std::size_t step, Sample *__restrict a, Sample *__restrict b,
+                       Sample *__restrict c)
+{
+    for (std::size_t i = 0; i < n; ++i, from += step)
     {
-        auto *to = reinterpret_cast<Sample *>(row);
-        for (int x = 0; x < width; ++x, from += pixelPlanes)
-            to[x] = *from;
+        a[i] = from[0];
+        b[i] = from[1];
+        c[i] = from[2];
     }
 }
 
-template <typename Sample>
-void scatter(const void *samples, std::size_t rowBytes, int width, int height, int pixelPlanes, int plane, void *pixels)
-{
-    auto *to = static_cast<Sample *>(pixels) + plane;
-    const auto *row = static_cast<const std::uint8_t *>(samples);
-    for (int y = 0; y < height; ++y, row += rowBytes)
-    {
-        const auto *from = reinterpret_cast<const Sample *>(row);
-        for (int x = 0; x < width; ++x, to += pixelPlanes)
-            *to = from[x];
+#define STILLMARK_SPLIT_THREE(SAMPLE) \
+    STILLMARK_MULTIVERSION \
+    void splitRow(std::size_t n, const SAMPLE *from, std::size_t step, SAMPLE *a, SAMPLE *b, SAMPLE *c) \
+    { \
+        return step == 3 ? splitThree(n, from, 3, a, b, c) : splitThree(n, from, step, a, b, c); \
     }
-}
+STILLMARK_SPLIT_THREE(std::uint8_t)
+STILLMARK_SPLIT_THREE(std::uint16_t)
+STILLMARK_SPLIT_THREE(std::uint32_t)
+#undef STILLMARK_SPLIT_THREE
 
 } // namespace
 
@@ -109,22 +134,47 @@ void sampleRaster::writePlane(const rectangle &area, int plane, const void *samp
     }
 }
 
-void pixelsToPlane(const void *pixels, int width, int height, int pixelPlanes, int sampleBytes, int plane,
-                   void *samples, std::size_t rowBytes)
+void pixelsToPlanes(const void *pixels, int width, int height, int pixelPlanes, int sampleBytes, int firstPlane,
+                    int planes, void *samples, std::size_t rowBytes, std::size_t planeBytes)
 {
-    const auto run = sampleBytes == 1   ? gather<std::uint8_t>
-                     : sampleBytes == 2 ? gather<std::uint16_t>
-                                        : gather<std::uint32_t>;
-    run(pixels, width, height, pixelPlanes, plane, samples, rowBytes);
+    withShape(sampleBytes, pixelPlanes, [&](auto sample, auto step) {
+        using type = decltype(sample);
+        const auto *from = static_cast<const type *>(pixels) + firstPlane;
+        const auto columns = static_cast<std::size_t>(width);
+        for (int y = 0; y < height; ++y, from += columns * static_cast<std::size_t>(pixelPlanes))
+        {
+            auto *const row = static_cast<std::uint8_t *>(samples) + static_cast<std::size_t>(y) * rowBytes;
+            const auto planeRow = [&](int p) {
+                return reinterpret_cast<type *>(row + static_cast<std::size_t>(p) * planeBytes);
+            };
+            int p = 0;
+            for (; p + 3 <= planes; p += 3)
+                splitRow(columns, from + p, static_cast<std::size_t>(pixelPlanes), planeRow(p), planeRow(p + 1),
+                         planeRow(p + 2));
+            for (; p < planes; ++p)
+            {
+                const type *one = from + p;
+                type *to = planeRow(p);
+                for (std::size_t x = 0; x < columns; ++x, one += step)
+                    to[x] = *one;
+            }
+        }
+    });
 }
 
 void planeToPixels(const void *samples, std::size_t rowBytes, int width, int height, int pixelPlanes, int sampleBytes,
                    int plane, void *pixels)
 {
-    const auto run = sampleBytes == 1   ? scatter<std::uint8_t>
-                     : sampleBytes == 2 ? scatter<std::uint16_t>
-                                        : scatter<std::uint32_t>;
-    run(samples, rowBytes, width, height, pixelPlanes, plane, pixels);
+    withShape(sampleBytes, pixelPlanes, [&](auto sample, auto planes) {
+        auto *to = static_cast<decltype(sample) *>(pixels) + plane;
+        const auto *row = static_cast<const std::uint8_t *>(samples);
+        for (int y = 0; y < height; ++y, row += rowBytes)
+        {
+            const auto *from = reinterpret_cast<const decltype(sample) *>(row);
+            for (int x = 0; x < width; ++x, to += planes)
+                *to = from[x];
+        }
+    });
 }
 
 } // namespace Stillmark

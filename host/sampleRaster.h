@@ -44,10 +44,10 @@ private:
     std::optional<Platform::scratchFile> disk;
 };
 
-/// Between pixels (pixelPlanes samples of sampleBytes 1, 2 or 4 side by side, rows without gaps) and one of their
-/// planes, whose rows start rowBytes apart.
-void pixelsToPlane(const void *pixels, int width, int height, int pixelPlanes, int sampleBytes, int plane,
-                   void *samples, std::size_t rowBytes);
+/// Between pixels (pixelPlanes samples of sampleBytes 1, 2 or 4 side by side, rows without gaps) and some of their
+/// planes, whose rows start rowBytes apart, from one plane to the next planeBytes.
+void pixelsToPlanes(const void *pixels, int width, int height, int pixelPlanes, int sampleBytes, int firstPlane,
+                    int planes, void *samples, std::size_t rowBytes, std::size_t planeBytes);
 void planeToPixels(const void *samples, std::size_t rowBytes, int width, int height, int pixelPlanes, int sampleBytes,
                    int plane, void *pixels);
 

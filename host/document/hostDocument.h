@@ -43,7 +43,7 @@ public:
 
     /// The block's autoMask, looked at with each write while the document is used: not 0 blends what is written into
     /// the picture by the selection. null, the default: no blending.
-    void watchAutoMask(const std::uint8_t *blockAutoMask) { autoMask = blockAutoMask; }
+    void watchAutoMask(const std::uint8_t *blockAutoMask) override { autoMask = blockAutoMask; }
 
     /// TNErrParameter for a port that is not the document's or not made for this, a rectangle that is empty or not
     /// within the channel's bounds, missing memory, another depth than the channel's, and strides that are not above 0
