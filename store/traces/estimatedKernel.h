@@ -1,6 +1,6 @@
 #pragma once
 
-#include "deblur/estimate/kernelEstimatorThread.h"
+#include "deblur/estimate/kernelEstimator.h"
 #include "store/timeLog.h"
 #include "store/traces/ctrlThread.h"
 #include "store/traces/kernel.h"
@@ -9,6 +9,12 @@
 
 namespace Project
 {
+
+/// Larger settings are estimated as this: about what the measure of the blur's size answers at most. What a file asks
+/// for beyond that would take hours.
+constexpr int kLargestEstimate = 399;
+
+CorvaneDeblur::noiseMode NoiseModeOf(const KernelSettings &settings);
 
 /// Where an estimation runs.
 enum class PEstimationRun
@@ -22,7 +28,8 @@ enum class PEstimationRun
 class PEstimatedKernel final : public PKernel
 {
 public:
-    using PKernel::PKernel;
+    PEstimatedKernel(PKernelCollection &home, const Sarnik::CRect &region, const KernelSettings &settings);
+    PEstimatedKernel(PKernelCollection &home, const PTraceRecord &record);
     PEstimatedKernel(const PEstimatedKernel &other);
     ~PEstimatedKernel() override;
 
@@ -35,6 +42,10 @@ public:
     /// settings as they are now count. A region outside of the picture starts nothing. Throws what reading throws, and
     /// is idle then.
     void StartEstimation(PEstimationRun run);
+    /// An estimation has been started and neither stopped nor fetched.
+    bool Busy() const { return estimator != nullptr; }
+    /// Asks the run to stop and waits for nothing: before StopEstimation, where several traces are to be stopped.
+    void CancelEstimation();
     /// Cancels; returns when the worker has stopped, after one alternation of its level at most. Nothing of the run is
     /// kept, and no record of the change that it was to answer.
     void StopEstimation();
@@ -59,8 +70,7 @@ public:
 
 private:
     void Launch(PEstimationRun run);
-    void Run(PEstimationRun run, std::function<void()> estimation);
-    void TakeResult();
+    void EndRun();
 
     int estimationState = 0;
     CorvaneDeblur::floatArray workKernel, regionGrey;

@@ -102,6 +102,7 @@ public:
     /// estimation answers is committed when that ends well, any other at once. While a record is open it serves for
     /// all further changes.
     void RecordSettingChange(std::uint32_t mask, std::uint32_t sourceId);
+    void DropPendingChange() { pendingTask.reset(); }
     bool HasPendingChange() const { return pendingTask != nullptr; }
 
     /// What the dialog keeps with the trace; null at first.
@@ -114,7 +115,6 @@ protected:
     void TakeRecord(const PTraceRecord &record);
     PTraceRecord ToRecord() const;
     void CommitPending();
-    void DropPending() { pendingTask.reset(); }
 
     PKernelCollection &home;
     CorvaneDeblur::floatArray kernelImage;

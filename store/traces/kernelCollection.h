@@ -4,6 +4,7 @@
 #include "deblur/estimate/autoTraces.h"
 #include "deblur/estimate/traceSize.h"
 #include "store/params.h"
+#include "store/traces/boundsGrey.h"
 #include "store/traces/estimatedKernel.h"
 #include "store/traces/taskPool.h"
 #include "store/traces/traceEvents.h"
@@ -129,7 +130,7 @@ public:
     void BuildAnalysisImage();
     /// Standard deviation of the noise; 0 before BuildAnalysisImage.
     float AnalysisNoise() const;
-    /// Measures how large the blur is and makes that the size of new traces. The list is empty before.
+    /// Measures how large the blur is and makes that the size of new traces. The list stays as it is.
     void FindDefaultSize();
     /// A trace at another place worth estimating, with the settings of the selected trace or else the default ones; not
     /// in the list yet. Null when there is no such place.
@@ -175,12 +176,10 @@ public:
     PTaskPool &Pool() { return pool; }
 
 private:
-    class boundsGrey;
-
-    bool Has(const PKernel *trace) const;
     void ListChanges();
-    template <typename Call> void ForEachEstimated(Call call) const;
-    int MostAutoTraces(int size) const;
+    /// Those with an estimation under way.
+    std::vector<PEstimatedKernel *> BusyTraces() const;
+    int MostAutoTraces() const;
     CorvaneDeblur::analysedImage &Analysed();
     const KernelSettings &SettingsForNew() const;
     std::vector<CorvaneDeblur::regionRect> EstimatedRegions() const;
@@ -205,7 +204,7 @@ private:
     std::uint16_t version = kNewestTraceVersion;
 
     const std::atomic<bool> *stopFlag = nullptr;
-    std::unique_ptr<boundsGrey> analysisSource;
+    std::unique_ptr<PBoundsGrey> analysisSource;
     std::unique_ptr<CorvaneDeblur::analysedImage> analysis;
 
     const std::string tableDirectory;

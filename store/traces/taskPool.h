@@ -1,19 +1,19 @@
 #pragma once
 
-#include <condition_variable>
 #include <functional>
 #include <memory>
-#include <mutex>
 
 namespace Project
 {
 
-/// Worker threads for long tasks that run beside the main thread. Tasks begin in the order in which they come, as many
-/// at once as there are workers, and at least one makes progress on a machine of a single processor while the main
-/// thread does nothing but look whether it has ended.
+/// Worker threads for long tasks that run beside the main thread: those of the process's thread pool, and one thread
+/// of its own in place of the main thread, which only looks on. So as many tasks run at once as the process may use
+/// threads, and there is progress on a machine of a single processor. Tasks begin in the order in which they come;
+/// their parallel loops are shared among the same threads.
 class PTaskPool
 {
 public:
+    /// The number of threads is what the calling thread may use now.
     PTaskPool();
     PTaskPool(const PTaskPool &) = delete;
     PTaskPool &operator=(const PTaskPool &) = delete;
@@ -24,11 +24,8 @@ public:
     void Enqueue(std::function<void()> task);
 
 private:
-    struct arenaOf; ///< keeps the library's header out of this one
-    const std::unique_ptr<arenaOf> arena;
-    std::mutex lock; ///< guards outstanding
-    std::condition_variable idle;
-    int outstanding = 0;
+    class workers; ///< keeps the library's header out of this one
+    const std::unique_ptr<workers> pool;
 };
 
 } // namespace Project
