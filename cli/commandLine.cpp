@@ -73,6 +73,9 @@ int runRemove(argumentParser &parser, commandDelegate &delegate)
                          throw usageError("'" + text + "' does not end in .png");
                      return text;
                  });
+    parser.value("--selection", "MASK", options.selection,
+                 "a picture of the photo's size: only where it is white the photo is looked at and changed",
+                 [](const std::string &text) { return text; });
     addCommon(parser, options.common);
     if (!parser.parse())
         return exitDone;

@@ -46,7 +46,7 @@ commandResult deconvolvePhoto(const deconvolveOptions &options, runContext &cont
     for (std::size_t i = 0; i < kernels.size(); ++i)
     {
         const rectangle region = options.kernelRegions.empty() ? wholeOf(picture) : options.kernelRegions[i];
-        requireInside(picture, region);
+        requireInside(picture, wholeOf(picture), region);
         settings.kernels.push_back(
             latentTrace(kernelFor(options.kernels[i], kernels[i], picture, context), region, options.strength));
     }

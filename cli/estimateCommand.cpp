@@ -24,7 +24,7 @@ rectangle wantedRegion(const estimateOptions &options, const photo &picture, int
 {
     if (options.region)
     {
-        requireInside(picture, *options.region);
+        requireInside(picture, wholeOf(picture), *options.region);
         return *options.region;
     }
     if (picture.width() <= largestRegionSide && picture.height() <= largestRegionSide)
@@ -63,10 +63,11 @@ commandResult estimateKernel(const estimateOptions &options, runContext &context
 {
     checkKernelPath(options.output);
     const photo picture = openPhoto(options.photo, context);
-    photoAnalysis analysis(picture, context);
+    photoAnalysis analysis(picture, wholeOf(picture), context);
     const int size = options.size ? *options.size : analysis.blurSize(options.noise);
     checkSkipped(options, size);
-    const rectangle region = regionFor(picture, wantedRegion(options, picture, size, analysis, context), size);
+    const rectangle region =
+        regionFor(picture, wholeOf(picture), wantedRegion(options, picture, size, analysis, context), size);
 
     estimationSettings settings;
     settings.noise = options.noise;

@@ -39,4 +39,23 @@ private:
     std::vector<std::byte> strip;
 };
 
+/// A rectangle of a photo as a picture of its own.
+class greyOfArea : public CorvaneDeblur::greySource
+{
+public:
+    /// The rectangle lies within the photo.
+    greyOfArea(const photo &source, const rectangle &part) : whole(source), area(part) {}
+
+    int cols() const override { return area.width; }
+    int rows() const override { return area.height; }
+    void readGrey(const CorvaneDeblur::regionRect &rect, const CorvaneDeblur::floatArray &out) override
+    {
+        whole.readGrey({rect.x + area.x, rect.y + area.y, rect.width, rect.height}, out);
+    }
+
+private:
+    greyOfPhoto whole;
+    const rectangle area;
+};
+
 } // namespace Stillmark

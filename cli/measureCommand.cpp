@@ -9,7 +9,8 @@ namespace Stillmark
 
 commandResult measurePhoto(const measureOptions &options, runContext &context)
 {
-    photoAnalysis analysis(openPhoto(options.photo, context), context);
+    const photo picture = openPhoto(options.photo, context);
+    photoAnalysis analysis(picture, wholeOf(picture), context);
     const float noise = analysis.noise();
     const int size = analysis.blurSize(CorvaneDeblur::noiseMode::automatic);
     const rectangle patch = analysis.noisePatch();

@@ -40,6 +40,7 @@ struct removeOptions
     bool artifactSuppression = true; ///< off: the Wiener method
     bool force = false;              ///< remove the blur even by traces judged poor
     std::string kernelPicture;       ///< empty: none
+    std::string selection;           ///< a mask, white where the photo may change; empty: all of it
 };
 
 struct estimateOptions

@@ -5,15 +5,20 @@
 #include "deblur/estimate/traceSize.h"
 
 #include <algorithm>
-#include <iterator>
 
 namespace Stillmark
 {
 
 using namespace CorvaneDeblur;
 
-photoAnalysis::photoAnalysis(const photo &analysed, runContext &run) : picture(analysed), context(run), source(analysed)
+photoAnalysis::photoAnalysis(const photo &analysed, const rectangle &part, runContext &run)
+    : area(part), context(run), source(analysed, part)
 {
+}
+
+rectangle photoAnalysis::fromArea(const regionRect &region) const
+{
+    return {region.x + area.x, region.y + area.y, region.width, region.height};
 }
 
 analysedImage &photoAnalysis::measured()
@@ -34,14 +39,14 @@ float photoAnalysis::noise()
 
 rectangle photoAnalysis::noisePatch()
 {
-    return fromEngine(measured().noisePatch());
+    return fromArea(measured().noisePatch());
 }
 
 int photoAnalysis::blurSize(noiseMode noise)
 {
     const int found = measured().findDefaultSize(noise);
     stopSignal::check();
-    return std::min(found | 1, maxKernelSize(picture.width(), picture.height()));
+    return std::min(found | 1, maxKernelSize(area.width, area.height));
 }
 
 photoAnalysis::regionList photoAnalysis::regions(int count, int size, noiseMode noise)
@@ -49,21 +54,22 @@ photoAnalysis::regionList photoAnalysis::regions(int count, int size, noiseMode 
     const autoRegionList found = measured().autoRegions(count, size, noise);
     stopSignal::check();
     regionList list{{}, found.size | 1};
-    std::transform(found.regions.begin(), found.regions.end(), std::back_inserter(list.regions), fromEngine);
+    for (const regionRect &region : found.regions)
+        list.regions.push_back(fromArea(region));
     return list;
 }
 
 std::vector<rectangle> photoAnalysis::regionNear(std::pair<int, int> point, int size, noiseMode noise)
 {
-    const auto found = measured().suggestRegionAt({point.first, point.second}, size, noise);
+    const auto found = measured().suggestRegionAt({point.first - area.x, point.second - area.y}, size, noise);
     stopSignal::check();
-    return found ? std::vector<rectangle>{fromEngine(*found)} : std::vector<rectangle>{};
+    return found ? std::vector<rectangle>{fromArea(*found)} : std::vector<rectangle>{};
 }
 
 bool photoAnalysis::hasStructure(int size)
 {
     const floatArray &grey = measured().analysis();
-    return CorvaneDeblur::hasStructure(grey, size, static_cast<double>(picture.width()) / grey.cols);
+    return CorvaneDeblur::hasStructure(grey, size, static_cast<double>(area.width) / grey.cols);
 }
 
 } // namespace Stillmark

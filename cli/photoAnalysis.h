@@ -12,12 +12,13 @@
 namespace Stillmark
 {
 
-/// Measures a photo when first asked, for the commands that need to know its noise, blur size or good regions.
-/// Throws Platform::cancelled after Ctrl-C. One thread at a time.
+/// Measures a part of a photo when first asked, for the commands that need to know its noise, blur size or good
+/// regions. Regions and points are in pixels of the photo. Throws Platform::cancelled after Ctrl-C. One thread at a
+/// time.
 class photoAnalysis
 {
 public:
-    photoAnalysis(const photo &analysed, runContext &run);
+    photoAnalysis(const photo &analysed, const rectangle &part, runContext &run);
 
     float noise();
     rectangle noisePatch();
@@ -41,9 +42,11 @@ public:
 private:
     CorvaneDeblur::analysedImage &measured();
 
-    photo picture;
+    rectangle fromArea(const CorvaneDeblur::regionRect &region) const;
+
+    const rectangle area;
     runContext &context;
-    greyOfPhoto source;
+    greyOfArea source;
     std::unique_ptr<CorvaneDeblur::analysedImage> analysis;
 };
 

@@ -50,7 +50,7 @@ private:
     photoWriter &result;
 };
 
-void save(photoWriter &result, runContext &context)
+template <class Result> void save(Result &result, runContext &context)
 {
     context.bar.stage("Saving");
     stopSignal::check();
@@ -125,6 +125,11 @@ void renderPhoto(const photo &picture, photoWriter &result, const renderSettings
     const auto progress = [&](int done, int total) { context.bar.set(static_cast<double>(done) / total); };
     if (!renderCells(cells, tables, source, destination, progress, stopSignal::requested()))
         throw Platform::cancelled();
+    save(result, context);
+}
+
+void saveResult(resultRaster &result, runContext &context)
+{
     save(result, context);
 }
 

@@ -1,33 +1,24 @@
 #include "cli/commands.h"
+#include "cli/filterRun.h"
 #include "cli/jsonWriter.h"
 #include "cli/kernelArrays.h"
-#include "cli/photoAnalysis.h"
 #include "cli/photoRender.h"
+#include "cli/runRecord.h"
 #include "cli/stopwatch.h"
 #include "cli/traceEstimation.h"
-#include "deblur/estimate/traceSize.h"
+#include "cli/tracePlan.h"
+#include "cli/traceRegion.h"
 #include "platform/files.h"
 
 #include <algorithm>
+#include <optional>
 
 namespace Stillmark
 {
 namespace
 {
 
-using CorvaneDeblur::deconvolutionMethod;
 using CorvaneDeblur::estimateStatus;
-using CorvaneDeblur::noiseMode;
-
-/// A picture below this is too small for the measures, which do not look for blurs below 31 pixels.
-constexpr int smallestMeasuredSide = 3 * 31;
-
-/// Where the blur is looked for, and how large it may be.
-struct searchPlan
-{
-    std::vector<rectangle> regions; ///< as estimated: with room for the size
-    int size = 0;
-};
 
 void checkTargets(const removeOptions &options)
 {
@@ -36,55 +27,30 @@ void checkTargets(const removeOptions &options)
         Platform::checkWritable(options.kernelPicture);
 }
 
-std::vector<rectangle> foundRegions(const removeOptions &options, const photo &picture, int &size,
-                                    photoAnalysis &analysis, runContext &context)
+/// What the plug-in is asked to do.
+recordedAction actionFor(const removeOptions &options, const photo &picture, const rectangle &area, runContext &context)
 {
-    if (!analysis.hasStructure(size))
+    if (isAutomatic(options, area))
+        return automaticAction(options.artifactSuppression);
+    const tracePlan plan = planTraces(options, picture, area, context);
+    std::vector<recordedTrace> traces;
+    for (const rectangle &region : plan.regions)
+        traces.push_back({region, plan.size, options.noise, options.strength, options.force, {}});
+    return actionWith(traces, area.width, area.height, options.artifactSuppression);
+}
+
+/// What the plug-in found, judged.
+std::vector<foundTrace> judged(const std::vector<recordedTrace> &recorded)
+{
+    std::vector<foundTrace> traces;
+    for (const recordedTrace &trace : recorded)
     {
-        context.notes.push_back(picture.path() + ": no structure found: there are no edges to see a blur by");
-        return {};
+        foundTrace found = judgeTrace(trace.region, trace.size | 1, trace.kernel);
+        if (!trace.active && found.status == estimateStatus::finished && !found.point)
+            found.status = estimateStatus::noStructure; // why else the plug-in should have left it out
+        traces.push_back(std::move(found));
     }
-    if (std::min(picture.width(), picture.height()) < smallestSearchedSide)
-        return {fromEngine(CorvaneDeblur::limitRegion(toEngine(wholeOf(picture))))};
-    auto found = analysis.regions(options.traces, size, options.noise);
-    if (found.regions.empty())
-        context.notes.push_back(picture.path() + ": no region found in which the blur could be seen well enough; " +
-                                "--region chooses one");
-    else if (static_cast<int>(found.regions.size()) < options.traces)
-        context.notes.push_back(picture.path() + ": only " + std::to_string(found.regions.size()) + " of " +
-                                std::to_string(options.traces) + " regions found");
-    size = found.size;
-    return found.regions;
-}
-
-searchPlan planSearch(const removeOptions &options, const photo &picture, photoAnalysis &analysis, runContext &context)
-{
-    for (const rectangle &region : options.regions)
-        requireInside(picture, region);
-    const int side = std::min(picture.width(), picture.height());
-    if (side < smallestMeasuredSide && (options.regions.empty() || !options.size))
-        throw Platform::fileError(picture.path() + ": too small to find a blur in: " + std::to_string(picture.width()) +
-                                  " x " + std::to_string(picture.height()) + " pixels");
-
-    searchPlan plan;
-    plan.size = options.size ? *options.size : analysis.blurSize(options.noise);
-    regionFor(picture, wholeOf(picture), plan.size); // or tells that the picture is too small for it
-    plan.regions =
-        options.regions.empty() ? foundRegions(options, picture, plan.size, analysis, context) : options.regions;
-    for (rectangle &region : plan.regions)
-        region = regionFor(picture, region, plan.size);
-    return plan;
-}
-
-std::vector<foundTrace> findBlur(const removeOptions &options, const photo &picture, const searchPlan &plan,
-                                 photoAnalysis &analysis, runContext &context)
-{
-    if (plan.regions.empty())
-        return {};
-    estimationSettings settings;
-    settings.noise = options.noise;
-    settings.noiseLevel = options.noise == noiseMode::automatic ? analysis.noise() : 0.0f;
-    return estimateTraces(picture, plan.regions, plan.size, settings, context);
+    return traces;
 }
 
 bool isApplied(const foundTrace &trace, const removeOptions &options)
@@ -93,8 +59,12 @@ bool isApplied(const foundTrace &trace, const removeOptions &options)
 }
 
 /// Tells which traces are left out, and how to have them all the same.
-void noteComplaints(const std::vector<foundTrace> &traces, const removeOptions &options, runContext &context)
+void noteTraces(const std::vector<foundTrace> &traces, const removeOptions &options, const rectangle &area,
+                runContext &context)
 {
+    if (traces.empty() && isAutomatic(options, area))
+        context.notes.push_back(options.photo + ": no region found in which the blur could be seen well enough; " +
+                                "--region chooses one");
     for (const foundTrace &trace : traces)
     {
         if (trace.cut && isApplied(trace, options))
@@ -133,12 +103,7 @@ std::string traceJson(const foundTrace &trace, bool applied)
                        {"sparsity", jsonNumber(trace.sparsity)}});
 }
 
-struct timings
-{
-    double measure = 0, estimate = 0, render = 0;
-};
-
-commandResult answer(const removeOptions &options, const std::vector<foundTrace> &traces, const timings &seconds,
+commandResult answer(const removeOptions &options, const std::vector<foundTrace> &traces, const filterAnswer &run,
                      const runContext &context)
 {
     commandResult result;
@@ -157,12 +122,11 @@ commandResult answer(const removeOptions &options, const std::vector<foundTrace>
     if (result.text.empty())
         result.text = options.output + ": the photo as it was";
     else
-        result.text += options.output + ": the blur was removed (" + secondsText(seconds.estimate) + " to find it, " +
-                       secondsText(seconds.render) + " to remove it)";
+        result.text += options.output + ": the blur was removed (" + secondsText(run.findSeconds) + " to find it, " +
+                       secondsText(run.renderSeconds) + " to remove it)";
     result.json = jsonObject({{"traces", jsonArray(traceTexts)},
-                              {"seconds", jsonObject({{"measure", jsonNumber(seconds.measure)},
-                                                      {"estimate", jsonNumber(seconds.estimate)},
-                                                      {"render", jsonNumber(seconds.render)}})},
+                              {"seconds", jsonObject({{"estimate", jsonNumber(run.findSeconds)},
+                                                      {"render", jsonNumber(run.renderSeconds)}})},
                               {"output", jsonString(options.output)},
                               {"notes", jsonArray(noteTexts)}});
     return result;
@@ -174,40 +138,27 @@ commandResult removeBlur(const removeOptions &options, runContext &context)
 {
     checkTargets(options);
     const photo picture = openPhoto(options.photo, context);
-    photoAnalysis analysis(picture, context);
-    timings seconds;
+    std::optional<selectionMask> selection;
+    if (!options.selection.empty())
+        selection = selectionMask::open(options.selection, picture.width(), picture.height(), context.progress());
+    const rectangle area = selection ? selection->bounds() : wholeOf(picture);
 
-    const stopwatch measuring;
-    const searchPlan plan = planSearch(options, picture, analysis, context);
-    seconds.measure = measuring.seconds();
+    resultRaster result(picture, options.output);
+    const recordedAction action = actionFor(options, picture, area, context);
+    const filterAnswer run = runFilter(picture, result, selection ? &*selection : nullptr, action, context);
+    const std::vector<foundTrace> traces = judged(tracesOf(run.recorded));
+    noteTraces(traces, options, area, context);
 
-    const stopwatch estimating;
-    const std::vector<foundTrace> traces = findBlur(options, picture, plan, analysis, context);
-    seconds.estimate = estimating.seconds();
-    noteComplaints(traces, options, context);
-
-    renderSettings settings;
-    settings.method = options.artifactSuppression ? deconvolutionMethod::fast : deconvolutionMethod::wiener;
-    for (const foundTrace &trace : traces)
-        if (isApplied(trace, options))
-            settings.kernels.push_back(latentTrace(trace.kernel, trace.region, options.strength));
-
-    const stopwatch rendering;
-    if (settings.kernels.empty())
+    if (std::any_of(traces.begin(), traces.end(), [&](const foundTrace &t) { return isApplied(t, options); }))
+        saveResult(result, context);
+    else
     {
         savePhotoUnchanged(picture, options.output, context);
         context.notes.push_back(options.output + ": nothing was removed; the picture is as it was");
     }
-    else
-    {
-        photoWriter result(picture, options.output);
-        renderPhoto(picture, result, settings, context);
-    }
-    seconds.render = rendering.seconds();
-
     if (!options.kernelPicture.empty())
         writePictureOfKernels(options, traces, context);
-    return answer(options, traces, seconds, context);
+    return answer(options, traces, run, context);
 }
 
 } // namespace Stillmark

@@ -15,7 +15,7 @@ std::vector<rectangle> findRegions(const suggestOptions &options, const photo &p
     if (options.near && (options.near->first >= picture.width() || options.near->second >= picture.height()))
         throw Platform::fileError(picture.path() + ": the point " + std::to_string(options.near->first) + "," +
                                   std::to_string(options.near->second) + " does not lie within the picture");
-    photoAnalysis analysis(picture, context);
+    photoAnalysis analysis(picture, wholeOf(picture), context);
     const int size = options.size ? *options.size : analysis.blurSize(noise);
     return options.near ? analysis.regionNear(*options.near, size, noise)
                         : analysis.regions(options.count, size, noise).regions;

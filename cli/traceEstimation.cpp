@@ -10,6 +10,7 @@
 #include <tbb/parallel_for.h>
 #include <tbb/task_arena.h>
 
+#include <algorithm>
 #include <condition_variable>
 #include <deque>
 #include <thread>
@@ -63,6 +64,23 @@ void apply(const estimationSettings &settings, kernelEstimator &estimator)
     estimator.imageToKernelRatio = imageToKernelRatio;
 }
 
+void judge(const floatArray &kernel, foundTrace &trace)
+{
+    trace.kernel = kernel;
+    trace.sparsity = kernelSparsity(kernel);
+    trace.good = isGoodKernel(kernel);
+    trace.point = isPointKernel(kernel);
+    trace.cut = borderShare(kernel) > 0.05;
+}
+
+bool isZero(const floatArray &kernel)
+{
+    for (int y = 0; y < kernel.rows; ++y)
+        if (std::any_of(kernel.row(y), kernel.row(y) + kernel.cols, [](float v) { return v != 0.0f; }))
+            return false;
+    return true;
+}
+
 foundTrace estimateTrace(const photo &picture, const rectangle &region, int size, int maskThreshold,
                          kernelEstimator &estimator)
 {
@@ -86,11 +104,7 @@ foundTrace estimateTrace(const photo &picture, const rectangle &region, int size
     {
         const auto levels = buildPyramid(size, size, pyramidScale, pyramidMinimum, estimator.pyramidLevel);
         trace.levels = static_cast<int>(levels.size());
-        trace.kernel = kernel;
-        trace.sparsity = kernelSparsity(kernel);
-        trace.good = isGoodKernel(kernel);
-        trace.point = isPointKernel(kernel);
-        trace.cut = borderShare(kernel) > 0.05;
+        judge(kernel, trace);
     }
     return trace;
 }
@@ -118,6 +132,20 @@ std::vector<foundTrace> estimateTraces(const photo &picture, const std::vector<r
     }
     stopSignal::check();
     return traces;
+}
+
+foundTrace judgeTrace(const rectangle &region, int size, const floatArray &kernel)
+{
+    foundTrace trace;
+    trace.region = region;
+    trace.size = size;
+    if (!isZero(kernel))
+        judge(kernel, trace);
+    else if (std::min(region.width, region.height) < imageToKernelRatio * size && region.width != 0)
+        trace.status = estimateStatus::imageTooSmall;
+    else
+        trace.status = estimateStatus::noStructure;
+    return trace;
 }
 
 std::string complaintAbout(const foundTrace &trace)

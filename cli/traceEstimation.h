@@ -40,6 +40,10 @@ struct foundTrace
 std::vector<foundTrace> estimateTraces(const photo &picture, const std::vector<rectangle> &regions, int size,
                                        const estimationSettings &settings, runContext &context);
 
+/// A kernel that was estimated elsewhere. One that is empty or all zero was not: its region has no room for the size,
+/// or no structure.
+foundTrace judgeTrace(const rectangle &region, int size, const CorvaneDeblur::floatArray &kernel);
+
 /// Whether a trace is worth removing without being asked to.
 inline bool isUsable(const foundTrace &trace)
 {

@@ -39,7 +39,7 @@ TEST(ProgressBar, FitsAnyTerminal)
 
 TEST(TraceRegion, GrowsToThreeKernelsInsideThePicture)
 {
-    const auto grown = [](rectangle r, int size) { return toEngine(grownRegion(r, size, 400, 300)); };
+    const auto grown = [](rectangle r, int size) { return toEngine(grownRegion(r, size, {0, 0, 400, 300})); };
     using region = CorvaneDeblur::regionRect;
     EXPECT_EQ(grown({10, 20, 93, 200}, 31), (region{10, 20, 93, 200})) << "large enough: as drawn";
     EXPECT_EQ(grown({150, 100, 50, 60}, 31), (region{128, 78, 94, 104})) << "43 missing: 22 more on every side";

@@ -1,0 +1,154 @@
+#include "cli/runRecord.h"
+
+#include "framework/base/container.h"
+#include "framework/base/exceptions.h"
+#include "shell/tintorel.h"
+#include "store/params.h"
+#include "store/traces/traceRecord.h"
+
+#include <algorithm>
+#include <cstring>
+#include <stdexcept>
+
+namespace Stillmark
+{
+namespace
+{
+
+using namespace Project;
+using Sarnik::CMemoryContainer;
+
+constexpr std::uint32_t keyVersion = TN_CODE('a', 'c', 't', 'V'), keyAutomatic = TN_CODE('a', 'u', 't', 'K'),
+                        keyHeight = TN_CODE('i', 'm', 'g', 'H'), keyWidth = TN_CODE('i', 'm', 'g', 'W'),
+                        keyCount = TN_CODE('k', 'n', 'l', 'C'), keyActive = TN_CODE('a', 'p', 'p', 'K'),
+                        keyParameters = TN_CODE('s', 'e', 't', 'S'), keyFine = TN_CODE('f', 'R', 'e', 't'),
+                        keyTraces = TN_CODE('k', 'n', 'l', 'M');
+
+std::vector<std::uint8_t> bytesOf(const CMemoryContainer &container)
+{
+    std::vector<std::uint8_t> bytes(container.Content().size());
+    if (!bytes.empty())
+        std::memcpy(bytes.data(), container.Content().data(), bytes.size());
+    return bytes;
+}
+
+PTraceRecord toRecord(const recordedTrace &trace)
+{
+    PTraceRecord record;
+    const rectangle &r = trace.region;
+    record.region = {r.x, r.y, r.x + r.width, r.y + r.height};
+    record.settings.size = trace.size;
+    record.settings.noiseLevel = static_cast<std::uint32_t>(trace.noise);
+    record.settings.smoothing = trace.strength.smoothing;
+    record.settings.suppression = trace.strength.suppression;
+    record.settings.forcedApply = trace.forced;
+    record.kernel = trace.kernel;
+    return record;
+}
+
+recordedTrace fromRecord(const PTraceRecord &record)
+{
+    recordedTrace trace;
+    const Sarnik::CRect &r = record.region;
+    trace.region = {r.left, r.top, static_cast<int>(r.Width()), static_cast<int>(r.Height())};
+    trace.size = record.settings.size;
+    trace.noise = static_cast<CorvaneDeblur::noiseMode>(std::min<std::uint32_t>(record.settings.noiseLevel, 3));
+    trace.strength = {record.settings.smoothing, record.settings.suppression};
+    trace.forced = record.settings.forcedApply;
+    trace.kernel = record.kernel;
+    trace.active = false;
+    return trace;
+}
+
+CMemoryContainer streamOf(const std::vector<recordedTrace> &traces)
+{
+    CMemoryContainer stream;
+    stream.WriteU32(static_cast<std::uint32_t>(traces.size()));
+    stream.WriteI32(-1); // none is selected
+    for (const recordedTrace &trace : traces)
+    {
+        stream.WriteU32(static_cast<std::uint32_t>(PKernelKind::Estimated));
+        WriteCommonRecord(stream, toRecord(trace));
+    }
+    stream.WriteU32(static_cast<std::uint32_t>(
+        std::count_if(traces.begin(), traces.end(), [](const auto &t) { return t.active; })));
+    for (std::uint32_t i = 0; i < traces.size(); ++i)
+        if (traces[i].active)
+            stream.WriteU32(i);
+    stream.WriteU32(0); // no size was found automatically
+    return stream;
+}
+
+void finish(recordedAction &action, bool artifactSuppression, const std::vector<recordedTrace> &traces)
+{
+    CMemoryContainer parameters;
+    PParams record;
+    record.fineResult = artifactSuppression;
+    WriteParameters(parameters, record);
+    action.put(keyParameters, bytesOf(parameters));
+    action.put(keyFine, artifactSuppression);
+    action.put(keyTraces, bytesOf(streamOf(traces)));
+}
+
+std::vector<recordedTrace> readStream(CMemoryContainer &stream)
+{
+    std::vector<recordedTrace> traces;
+    const std::uint32_t count = stream.ReadU32();
+    stream.ReadI32();
+    for (std::uint32_t i = 0; i < count; ++i) // each reads something, so the data bounds it
+    {
+        const std::uint32_t kind = stream.ReadU32();
+        PTraceRecord record = ReadCommonRecord(stream, kNewestTraceVersion);
+        if (kind == static_cast<std::uint32_t>(PKernelKind::Manual))
+            ReadLine(stream, record);
+        traces.push_back(fromRecord(record));
+    }
+    const std::uint32_t active = stream.ReadU32();
+    for (std::uint32_t i = 0; i < active; ++i)
+        if (const std::uint32_t index = stream.ReadU32(); index < traces.size())
+            traces[index].active = true;
+    return traces;
+}
+
+} // namespace
+
+recordedAction automaticAction(bool artifactSuppression)
+{
+    recordedAction action;
+    action.put(keyVersion, std::int32_t{kNewestTraceVersion});
+    action.put(keyAutomatic, true);
+    finish(action, artifactSuppression, {});
+    return action;
+}
+
+recordedAction actionWith(const std::vector<recordedTrace> &traces, int width, int height, bool artifactSuppression)
+{
+    recordedAction action;
+    action.put(keyVersion, std::int32_t{kNewestTraceVersion});
+    action.put(keyAutomatic, false);
+    action.put(keyHeight, height);
+    action.put(keyWidth, width);
+    action.put(keyCount, static_cast<std::int32_t>(traces.size()));
+    action.put(keyActive, static_cast<std::int32_t>(traces.size()));
+    finish(action, artifactSuppression, traces);
+    return action;
+}
+
+std::vector<recordedTrace> tracesOf(const recordedAction &action)
+{
+    const recordedAction::value *value = action.find(keyTraces);
+    const auto *bytes = value != nullptr ? std::get_if<std::vector<std::uint8_t>>(value) : nullptr;
+    if (bytes == nullptr)
+        throw std::runtime_error("the recorded run holds no traces");
+    CMemoryContainer stream(std::as_bytes(std::span(*bytes)));
+    try
+    {
+        return readStream(stream);
+    }
+    catch (const Sarnik::CException &e)
+    {
+        throw std::runtime_error("the recorded run cannot be read: " + e.GetErrorString());
+    }
+}
+
+} // namespace Stillmark
