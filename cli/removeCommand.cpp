@@ -2,6 +2,7 @@
 #include "cli/filterRun.h"
 #include "cli/jsonWriter.h"
 #include "cli/kernelArrays.h"
+#include "cli/photoAnalysis.h"
 #include "cli/photoRender.h"
 #include "cli/runRecord.h"
 #include "cli/stopwatch.h"
@@ -58,13 +59,19 @@ bool isApplied(const foundTrace &trace, const removeOptions &options)
     return isUsable(trace) || (options.force && trace.status == estimateStatus::finished);
 }
 
-/// Tells which traces are left out, and how to have them all the same.
-void noteTraces(const std::vector<foundTrace> &traces, const removeOptions &options, const rectangle &area,
-                runContext &context)
+/// Why the plug-in found nothing by itself.
+void noteNothingFound(const photo &picture, const rectangle &area, runContext &context)
 {
-    if (traces.empty() && isAutomatic(options, area))
-        context.notes.push_back(options.photo + ": no region found in which the blur could be seen well enough; " +
-                                "--region chooses one");
+    const bool structure = photoAnalysis(picture, area, context).hasStructure(0);
+    context.notes.push_back(picture.path() +
+                            (structure ? ": no region found in which the blur could be seen well enough; --region "
+                                         "chooses one"
+                                       : ": no structure found: there are no edges to see a blur by"));
+}
+
+/// Tells which traces are left out, and how to have them all the same.
+void noteTraces(const std::vector<foundTrace> &traces, const removeOptions &options, runContext &context)
+{
     for (const foundTrace &trace : traces)
     {
         if (trace.cut && isApplied(trace, options))
@@ -147,7 +154,9 @@ commandResult removeBlur(const removeOptions &options, runContext &context)
     const recordedAction action = actionFor(options, picture, area, context);
     const filterAnswer run = runFilter(picture, result, selection ? &*selection : nullptr, action, context);
     const std::vector<foundTrace> traces = judged(tracesOf(run.recorded));
-    noteTraces(traces, options, area, context);
+    if (traces.empty() && isAutomatic(options, area))
+        noteNothingFound(picture, area, context);
+    noteTraces(traces, options, context);
 
     if (std::any_of(traces.begin(), traces.end(), [&](const foundTrace &t) { return isApplied(t, options); }))
         saveResult(result, context);

@@ -30,12 +30,13 @@ bool PFilter::WaitForTraces(double from, double to)
 }
 
 /// Whether a trace has nothing to say: its region shows no edges, or its kernel is a point, for nothing has moved.
-/// Removing it would add noise and take nothing away.
+/// Removing it would add noise and take nothing away. A point may be what the user wants; what was seen where there is
+/// nothing to see is not.
 bool PFilter::IsUseless(PKernel &trace)
 {
     if (!trace.HasKernel())
         return false;
-    if (CorvaneDeblur::isPointKernel(trace.KernelImage()))
+    if (!trace.Settings().forcedApply && CorvaneDeblur::isPointKernel(trace.KernelImage()))
         return true;
     const Sarnik::CRect region =
         trace.Region().Empty() ? Picture().Bounds() : trace.Region().Intersected(Picture().Bounds());
@@ -48,7 +49,7 @@ void PFilter::LeaveOutUseless(const std::vector<PKernel *> &estimated)
 {
     PKernelCollection &traces = *GetKernels();
     for (PKernel *trace : estimated)
-        if (!trace->Settings().forcedApply && IsUseless(*trace))
+        if (IsUseless(*trace))
         {
             if (trace == traces.LoneTrace())
                 traces.DeactivateAll();
