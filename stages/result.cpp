@@ -2,9 +2,12 @@
 
 #include "stages/imageHub.h"
 #include "stages/render/collectKernels.h"
+#include "stages/scaledStage.h"
 #include "stages/source.h"
+#include "store/traces/ctrlThread.h"
 
-#include <cmath>
+#include <atomic>
+#include <exception>
 
 namespace Project
 {
@@ -15,13 +18,59 @@ using Sarnik::CRect;
 namespace
 {
 
+CRect grown(const CRect &area, std::int64_t margin)
+{
+    return {CRect::Clamped(area.left - margin), CRect::Clamped(area.top - margin), CRect::Clamped(area.right + margin),
+            CRect::Clamped(area.bottom + margin)};
+}
+
 /// Kernels of fewer pixels at the render's scale change nothing that can be seen.
 constexpr float leastKernelSize = 5.0f;
 
 } // namespace
 
-PResult::PResult(PImageHub &owner, bool onlyFast) : PStage(owner, 1), fastOnly(onlyFast)
+struct PResult::PPendingCell
 {
+    PPendingCell(const CRect &area, renderSettings &&with, CorvaneDeblur::shrinkageTableStore &tables)
+        : cell(area), settings(std::move(with)), pool(settings, tables)
+    {
+    }
+
+    void Run() noexcept
+    {
+        try
+        {
+            job->Run();
+        }
+        catch (...)
+        {
+            error = std::current_exception();
+        }
+        finished.store(true, std::memory_order_release);
+    }
+
+    const CRect cell;
+    const renderSettings settings;
+    PEstimatorPool pool;
+    std::unique_ptr<PRenderJob> job;
+    std::exception_ptr error;
+    std::atomic<bool> finished{false};
+};
+
+PResult::PResult(PImageHub &owner, Role what)
+    : PStage(owner, 1), role(what), control(std::make_unique<PCtrlThread>(owner.TaskPool()))
+{
+}
+
+PResult::~PResult()
+{
+    CancelJob();
+}
+
+void PResult::Reset()
+{
+    CancelJob();
+    PStage::Reset();
 }
 
 void PResult::SetBounds(const CRect &newRect)
@@ -29,7 +78,9 @@ void PResult::SetBounds(const CRect &newRect)
     if (newRect == Rect() && HasPixmap())
         return;
     const PPlaneLayout layout = hub.Layout();
-    Reset();
+    CancelJob();
+    if (scaled != (newRect != hub.ImageBounds()))
+        Reset(); // from now on out of another source
     Place(newRect, layout.depth, layout.ResultPlanes());
     scaled = newRect != hub.ImageBounds();
     scale = scaled && !newRect.Empty()
@@ -39,6 +90,8 @@ void PResult::SetBounds(const CRect &newRect)
 
 PStage &PResult::SourceStage() const
 {
+    if (scaled)
+        return hub.SourceFast();
     return hub.Source();
 }
 
@@ -50,13 +103,15 @@ bool PResult::NeedsRender(const CRect &cell) const
     return !hub.SelectionAt(*this).Intersected(cell).Empty();
 }
 
-CRect PResult::SourceRect(const CRect &cell) const
+std::int64_t PResult::Margin() const
 {
     // The kernel's width at full resolution: at a smaller scale that is more than needed, and does no harm.
-    const std::int64_t margin = 2 * std::int64_t{largestReadyKernel(hub.Host().Kernels())};
-    return CRect{CRect::Clamped(cell.left - margin), CRect::Clamped(cell.top - margin),
-                 CRect::Clamped(cell.right + margin), CRect::Clamped(cell.bottom + margin)}
-        .Intersected(Rect());
+    return 2 * std::int64_t{largestReadyKernel(hub.Host().Kernels())};
+}
+
+CRect PResult::SourceRect(const CRect &cell) const
+{
+    return grown(cell, Margin()).Intersected(Rect());
 }
 
 bool PResult::CollectSettings(renderSettings &settings) const
@@ -65,7 +120,7 @@ bool PResult::CollectSettings(renderSettings &settings) const
     const bool reduced = scale < 1.0f;
     const bool ready = collectAllKernels(hub.Host().Kernels(), hub.Host().Params(), hub.Layout().colours, scale,
                                          reduced ? image.left : 0, reduced ? image.top : 0, settings);
-    if (fastOnly)
+    if (role == Role::rough)
         settings.method = CorvaneDeblur::deconvolutionMethod::wiener;
     return ready;
 }
@@ -120,6 +175,77 @@ void PResult::RenderNow(const CRect &cell, std::int64_t column, std::int64_t row
     TakeOver(column, row, *job);
 }
 
+bool PResult::RenderBeside(const CRect &cell, std::int64_t column, std::int64_t row)
+{
+    if (pending && pending->cell != cell)
+        CancelJob();
+    if (pending)
+    {
+        if (!pending->finished.load(std::memory_order_acquire))
+            return false;
+        const std::shared_ptr<PPendingCell> done = std::move(pending);
+        if (done->error)
+            std::rethrow_exception(done->error);
+        TakeOver(column, row, *done->job);
+        return true;
+    }
+    // One that was dropped ends at its next plane; until then no other begins.
+    if (ending && !ending->finished.load(std::memory_order_acquire) && control->Running() > 0)
+        return false;
+    ending.reset();
+    renderSettings settings;
+    CollectSettings(settings);
+    const auto next = std::make_shared<PPendingCell>(cell, std::move(settings), hub.Tables());
+    next->job = MakeJob(cell, next->settings, next->pool);
+    control->Queue([next] { next->Run(); });
+    pending = next;
+    CopySource(cell); // something to look at
+    return false;
+}
+
+void PResult::CancelJob()
+{
+    if (!pending)
+        return;
+    pending->pool.Stop();
+    ending = std::move(pending);
+    control->Withdraw();
+}
+
+void PResult::Notify(const CRect &changed)
+{
+    if (HasPixmap())
+        Invalidate(grown(changed, Margin()));
+}
+
+void PResult::Invalidate(const CRect &wanted)
+{
+    const Range cells = Touched(wanted);
+    if (cells.columns == 0 || cells.rows == 0)
+        return;
+    LowerState(wanted, 0);
+    CancelJob();
+    // A cell is transformed as a whole: all of it may come out different.
+    const CRect first = TileRect(cells.column, cells.row);
+    const CRect last = TileRect(cells.column + cells.columns - 1, cells.row + cells.rows - 1);
+    const CRect area{first.left, first.top, last.right, last.bottom};
+    switch (role)
+    {
+    case Role::rough:
+        hub.TellPreviews(area, PNotice::resultRough);
+        break;
+    case Role::fast:
+        hub.TellPreviews(area, PNotice::resultFast);
+        break;
+    case Role::full:
+        hub.TellPreviews(area, PNotice::resultFull);
+        if (hub.Stages().resultFullScaled)
+            hub.Stages().resultFullScaled->Notify(area);
+        break;
+    }
+    hub.MarkDirty();
+}
+
 std::uint64_t PResult::ProcessCell(std::int64_t column, std::int64_t row, bool force)
 {
     if (CellRemaining(column, row) == 0)
@@ -135,13 +261,23 @@ std::uint64_t PResult::ProcessCell(std::int64_t column, std::int64_t row, bool f
     PStage &source = SourceStage();
     std::uint64_t count = 0;
     if (force)
+    {
         count = source.ForceRect(wanted);
+        if (!source.Finished(wanted))
+            return count;
+    }
     else if ((count = source.StepRect(wanted)) != 0)
         return count;
-    if (render)
-        RenderNow(cell, column, row);
-    else
+    if (!render)
         TakeSource(column, row);
+    else if (!useWorker)
+        RenderNow(cell, column, row);
+    else if (!RenderBeside(cell, column, row))
+    {
+        if (force)
+            return count;
+        hub.AddAbandoned(1);
+    }
     return count + 1;
 }
 

@@ -6,16 +6,38 @@
 namespace Project
 {
 
+class PCtrlThread;
+
 /// The deconvolved picture at one scale, cell by cell.
 class PResult final : public PStage
 {
 public:
-    /// fastOnly: Wiener whatever the parameters say.
-    PResult(PImageHub &owner, bool fastOnly);
+    enum class Role
+    {
+        rough, ///< at preview size, Wiener whatever the parameters say
+        fast,  ///< at preview size, by the chosen method
+        full   ///< at full resolution
+    };
+    PResult(PImageHub &owner, Role what);
+    ~PResult() override;
 
-    /// The whole picture at the stage's scale: full resolution where it is the hub's image bounds.
+    void Reset() override;
+    /// The whole picture at the stage's scale: full resolution where it is the hub's image bounds. Where only the place
+    /// changes, pixels and states stay.
     void SetBounds(const Sarnik::CRect &newRect);
     std::uint64_t ProcessCell(std::int64_t column, std::int64_t row, bool force) override;
+
+    /// The source stage has changed there, and with it all cells that read it.
+    void Notify(const Sarnik::CRect &changed);
+    /// The cells that a rectangle touches are to be computed again; a job under way is worth nothing any more, and the
+    /// dependents are told.
+    void Invalidate(const Sarnik::CRect &area);
+    void InvalidateAll() { Invalidate(Rect()); }
+    /// Whether cells are computed beside the main thread, on the hub's task pool: so at first. A cell that is under way
+    /// stays behind, shows its source, and reports itself to the hub as abandoned. Otherwise ProcessCell computes it.
+    void SetUseWorker(bool use) { useWorker = use; }
+    /// Drops the job under way; it ends soon.
+    void CancelJob();
 
     bool Scaled() const { return scaled; }
     float Scale() const { return scale; }
@@ -40,11 +62,21 @@ public:
 private:
     PStage &SourceStage() const;
     void CopySource(const Sarnik::CRect &area);
+    std::int64_t Margin() const;
     void RenderNow(const Sarnik::CRect &cell, std::int64_t column, std::int64_t row);
+    bool RenderBeside(const Sarnik::CRect &cell, std::int64_t column, std::int64_t row);
 
-    const bool fastOnly;
+    const Role role;
     bool scaled = false;
     float scale = 1.0f;
+    bool useWorker = true;
+
+    /// A cell that is computed beside the main thread, with all that it needs. The worker alone touches it until
+    /// `finished`.
+    struct PPendingCell;
+    std::shared_ptr<PPendingCell> pending; ///< the one that is waited for
+    std::shared_ptr<PPendingCell> ending;  ///< one that was dropped while it ran
+    std::unique_ptr<PCtrlThread> control;  ///< after the cells: its end waits for the worker
 };
 
 } // namespace Project

@@ -1,6 +1,8 @@
 #include "stages/source.h"
 
 #include "stages/imageHub.h"
+#include "stages/result.h"
+#include "stages/scaledStage.h"
 
 namespace Project
 {
@@ -15,6 +17,23 @@ void PSource::SetBounds(const CRect &newRect)
         return;
     Reset(); // moved pixels would be those of another place
     Place(newRect, layout.depth, layout.SourcePlanes());
+}
+
+void PSource::Invalidate(const CRect &wanted)
+{
+    const CRect area = wanted.Intersected(Rect());
+    if (area.Empty())
+        return;
+    LowerState(area, 0);
+    const PStageSet &stages = hub.Stages();
+    for (PSourceScaled *scaled : {stages.sourceAccurate.get(), stages.sourceExtra.get()})
+        if (scaled != nullptr)
+            scaled->Notify(area);
+    for (PResult *result : {stages.resultFull.get(), stages.resultRough.get(), stages.resultFast.get()})
+        if (result != nullptr && !result->Scaled())
+            result->Notify(area);
+    hub.TellPreviews(area, PNotice::source);
+    hub.MarkDirty();
 }
 
 std::uint64_t PSource::ProcessCell(std::int64_t column, std::int64_t row, bool)

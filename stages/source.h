@@ -13,6 +13,8 @@ public:
     explicit PSource(PImageHub &owner) : PStage(owner, 1) {}
 
     void SetBounds(const Sarnik::CRect &newRect);
+    /// The host's pixels have changed there.
+    void Invalidate(const Sarnik::CRect &area);
     std::uint64_t ProcessCell(std::int64_t column, std::int64_t row, bool force) override;
 };
 

@@ -6,6 +6,11 @@
 
 #include <cstdint>
 
+namespace Sarnik
+{
+class CQuadConverter;
+}
+
 namespace Project
 {
 
@@ -32,6 +37,9 @@ public:
     virtual void ReadSelection(Sarnik::CBasicPixmap &pixmap, int plane) = 0;
     /// Takes finished pixels: the colour planes, then transparency if HasTransparency. Throws CException.
     virtual void Write(Sarnik::CBasicPixmap &pixmap, const Sarnik::CRect &rect) = 0;
+
+    /// From CMYK for the display; null where the host cannot.
+    virtual Sarnik::CQuadConverter *CmykConverter() { return nullptr; }
 
     virtual Sarnik::CPageStore &PageStore() = 0;
     virtual PParams &Params() = 0;
