@@ -7,7 +7,7 @@ buildPackages=(
     libfftw3-dev libtbb-dev libpng-dev libvips-dev liblcms2-dev libcli11-dev
 )
 # shellcheck disable=SC2034
-testPackages=(libgtest-dev libgmock-dev libbenchmark-dev clang-format)
+testPackages=(libgtest-dev libgmock-dev libbenchmark-dev clang-format python3)
 
 # missingPackages PACKAGE...: prints those that are not installed, one a line.
 missingPackages()
