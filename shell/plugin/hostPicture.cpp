@@ -1,5 +1,6 @@
 #include "shell/plugin/hostPicture.h"
 
+#include "framework/base/exceptions.h"
 #include "shell/layerReader.h"
 #include "shell/plugin/filter.h"
 #include "shell/plugin/regionGrey.h"
@@ -84,6 +85,9 @@ bool PHostPicture::Abort()
 void PHostPicture::ReadGrey(const CRect &rect, std::uint8_t maskThreshold, const CorvaneDeblur::floatArray &grey,
                             const CorvaneDeblur::byteArray &mask)
 {
+    // Looking at a large picture takes a while, and nothing else asks meanwhile.
+    if (Abort())
+        throw Sarnik::CAbort(true);
     PSource &source = filter.GetImageHub()->Source();
     source.ForceRect(rect);
     Sarnik::CGreySource about;

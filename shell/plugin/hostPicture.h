@@ -41,7 +41,8 @@ public:
     Sarnik::CRect Bounds() const override { return ImageBounds(); }
     int Planes() const override { return Format().planes; }
     int Depth() const override { return Format().depth; }
-    /// From the pages of the source stage, so that the host is read once for the estimation and the render.
+    /// From the pages of the source stage, so that the host is read once for the estimation and the render. Throws
+    /// CAbort, silent, when the user wants it to end.
     void ReadGrey(const Sarnik::CRect &rect, std::uint8_t maskThreshold, const CorvaneDeblur::floatArray &grey,
                   const CorvaneDeblur::byteArray &mask) override;
 
