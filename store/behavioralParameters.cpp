@@ -88,8 +88,13 @@ void ReadBehavioralParameters(const std::string &directory, PParams &parameters)
     if (!BehavioralParametersExist(directory)) // a folder or a pipe of that name is no such file
         return;
     std::ifstream file(FileIn(directory), std::ios::binary);
+    ReadBehavioralParameters(file, parameters);
+}
+
+void ReadBehavioralParameters(std::istream &lines, PParams &parameters)
+{
     std::string line;
-    for (char c = 0; file.get(c);)
+    for (char c = 0; lines.get(c);)
     {
         line += c;
         const bool ended = c == '\n' || c == '\r';

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <iosfwd>
 #include <string>
 
 namespace Project
@@ -17,5 +18,7 @@ bool BehavioralParametersExist(const std::string &directory);
 /// nothing happens; a line with another key, too long for its key or beyond 254 characters is passed over in silence.
 /// A line is held at a time, so the file may be of any length. Throws nothing but std::bad_alloc.
 void ReadBehavioralParameters(const std::string &directory, PParams &parameters);
+/// The same for the lines of a stream.
+void ReadBehavioralParameters(std::istream &lines, PParams &parameters);
 
 } // namespace Project
