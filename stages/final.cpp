@@ -29,19 +29,23 @@ std::uint64_t PFinal::ProcessCell(std::int64_t column, std::int64_t row, bool fo
         count = result.ForceRect(cell);
     else if ((count = result.StepRect(cell)) != 0)
         return count;
-    WriteCell(cell.Intersected(bounds), result);
-    ++State(column, row);
+    WriteFrom(column, row, result);
     return count + 1;
 }
 
-void PFinal::WriteCell(const CRect &cell, PResult &result)
+void PFinal::WriteFrom(std::int64_t column, std::int64_t row, PStage &stage)
 {
-    if (cell.Empty())
-        return;
     const PPlaneLayout layout = hub.Layout();
+    const CRect cell = TileRect(column, row);
     Sarnik::CMemoryPixmap pixels(cell, layout.depth, layout.ResultPlanes());
-    copyPlanes(pixels, 0, result.Pixmap(), 0, layout.ResultPlanes(), cell);
-    hub.Host().Write(pixels, cell);
+    copyPlanes(pixels, 0, stage.Pixmap(), 0, layout.ResultPlanes(), cell);
+    Write(column, row, pixels);
+}
+
+void PFinal::Write(std::int64_t column, std::int64_t row, Sarnik::CMemoryPixmap &pixels)
+{
+    hub.Host().Write(pixels, TileRect(column, row));
+    ++State(column, row);
 }
 
 } // namespace Project

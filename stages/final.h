@@ -1,5 +1,6 @@
 #pragma once
 
+#include "framework/pixels/memoryPixmap.h"
 #include "stages/stage.h"
 
 namespace Project
@@ -18,9 +19,12 @@ public:
     void SetBounds(const Sarnik::CRect &rect);
     std::uint64_t ProcessCell(std::int64_t column, std::int64_t row, bool force) override;
 
-private:
-    void WriteCell(const Sarnik::CRect &cell, PResult &result);
+    /// What a cell is to be is there already: over the result's cell, planes as the layout's ResultPlanes().
+    void Write(std::int64_t column, std::int64_t row, Sarnik::CMemoryPixmap &pixels);
+    /// It is in a stage's first planes.
+    void WriteFrom(std::int64_t column, std::int64_t row, PStage &stage);
 
+private:
     PImageHub &hub;
     Sarnik::CRect bounds;
 };

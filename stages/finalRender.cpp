@@ -91,17 +91,16 @@ private:
     /// Reads what the next cell needs, and puts it into the line.
     void Begin(std::uint64_t index)
     {
-        const cellPlace place = ResultCell(PlaceOf(index, final.columns));
+        const cellPlace cell = PlaceOf(index, final.columns), place = ResultCell(cell);
         std::unique_ptr<PRenderJob> job;
         if (result.CellRemaining(place.column, place.row) != 0)
         {
-            const CRect cell = result.TileRect(place.column, place.row);
-            const bool render = ready && result.NeedsRender(cell);
-            hub.Source().ForceRect(render ? result.SourceRect(cell) : cell);
+            // The whole cell, whatever part of it is written: that is what the preview shows, too.
+            const CRect area = result.TileRect(place.column, place.row);
+            const bool render = ready && result.NeedsRender(area);
+            hub.Source().ForceRect(render ? result.SourceRect(area) : final.TileRect(cell.column, cell.row));
             if (render)
-                job = result.MakeJob(cell, settings, pool);
-            else
-                result.TakeSource(place.column, place.row);
+                job = result.MakeJob(area, settings, pool);
         }
         line.Add(std::move(job));
     }
@@ -111,8 +110,11 @@ private:
     {
         const cellPlace cell = PlaceOf(written, final.columns), place = ResultCell(cell);
         if (const std::unique_ptr<PLineJob> job = line.Take())
-            result.TakeOver(place.column, place.row, static_cast<PRenderJob &>(*job));
-        final.RunCellFully(cell.column, cell.row);
+            final.Write(cell.column, cell.row, static_cast<PRenderJob &>(*job).Result());
+        else if (result.CellRemaining(place.column, place.row) == 0)
+            final.WriteFrom(cell.column, cell.row, result);
+        else
+            final.WriteFrom(cell.column, cell.row, hub.Source());
         ++written;
     }
 

@@ -19,7 +19,7 @@ struct PFinalWatcher
 /// the current tbb arena, each from its own copy of what it reads; the main thread alone reads the host, moves pixels
 /// in and out of the stages' pixmaps, and writes, row of cells by row, left to right. What is under way at a time is
 /// bounded by the number of threads, and the bytes do not depend on it. Cells that the result stage has finished
-/// before are written as they are.
+/// before are written as they are; the others go past it, straight to the host.
 ///
 /// False where it was cancelled: what was written stays written. Exceptions of the host come out of it.
 bool renderFinal(PImageHub &hub, const PFinalWatcher &watcher);

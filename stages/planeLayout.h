@@ -3,9 +3,10 @@
 namespace Project
 {
 
-/// Which planes the stages' pixmaps have. Source stages carry the colours, transparency (opaque where the picture has
-/// none: the grey conversion counts on the plane) and the selection where there is one; results carry the colours, and
-/// transparency only where the picture has it.
+/// Which planes the stages' pixmaps have. Source stages carry the colours, transparency and the selection where there
+/// is one; results carry the colours, and transparency only where the picture has it. Where the picture has none the
+/// source's plane is there all the same, since the grey conversion counts planes; nobody fills or reads it, and it
+/// costs no memory.
 struct PPlaneLayout
 {
     int depth = 8;

@@ -1,6 +1,5 @@
 #include "stages/scaledStage.h"
 
-#include "framework/pixels/fills.h"
 #include "stages/imageHub.h"
 #include "stages/result.h"
 #include "stages/source.h"
@@ -55,21 +54,18 @@ std::uint64_t PScaledStage::ProcessCell(std::int64_t column, std::int64_t row, b
 
 void PScaledStage::FillPart(const CRect &part, const CRect &area)
 {
-    const int planes = Planes(), opaque = OpaquePlane();
+    const int planes = Planes(), unused = UnusedPlane();
     CMemoryPixmap from(area, hub.Layout().depth, planes), to(part, hub.Layout().depth, planes);
-    // All planes, or those before and those behind the opaque one.
-    const int firstRun = opaque < 0 ? planes : opaque;
     const auto scalePlanes = [&](int first, int count) {
         copyPlanes(from, first, Larger().Pixmap(), first, count, area);
         scaler.Scale(from, first, to, first, count);
+        copyPlanes(Pixmap(), first, to, first, count, part);
     };
-    scalePlanes(0, firstRun);
-    if (opaque >= 0)
-    {
-        fillArea(to, opaque, part, Sarnik::opaqueValue(hub.Layout().depth));
-        scalePlanes(opaque + 1, planes - opaque - 1);
-    }
-    copyPlanes(Pixmap(), 0, to, 0, planes, part);
+    if (unused < 0)
+        return scalePlanes(0, planes);
+    scalePlanes(0, unused);
+    if (unused + 1 < planes)
+        scalePlanes(unused + 1, planes - unused - 1);
 }
 
 void PScaledStage::Notify(const CRect &changed)
@@ -108,7 +104,7 @@ int PSourceScaled::Planes() const
     return hub.Layout().SourcePlanes();
 }
 
-int PSourceScaled::OpaquePlane() const
+int PSourceScaled::UnusedPlane() const
 {
     return hub.Layout().transparency ? -1 : hub.Layout().colours;
 }

@@ -26,8 +26,8 @@ protected:
 
     virtual PStage &Larger() const = 0;
     virtual int Planes() const = 0;
-    /// A plane that is opaque all over and needs no scaling; -1 for none.
-    virtual int OpaquePlane() const { return -1; }
+    /// A plane that nobody fills; -1 for none.
+    virtual int UnusedPlane() const { return -1; }
 
 private:
     void FillPart(const Sarnik::CRect &part, const Sarnik::CRect &area);
@@ -52,7 +52,7 @@ public:
 protected:
     PStage &Larger() const override;
     int Planes() const override;
-    int OpaquePlane() const override;
+    int UnusedPlane() const override;
 
 private:
     const From from;

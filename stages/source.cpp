@@ -44,11 +44,15 @@ std::uint64_t PSource::ProcessCell(std::int64_t column, std::int64_t row, bool)
     if (!cell.Empty())
     {
         const PPlaneLayout layout = hub.Layout();
-        CMemoryPixmap pixels(cell, layout.depth, layout.SourcePlanes());
+        CMemoryPixmap pixels(cell, layout.depth, layout.ResultPlanes());
         hub.Host().ReadSource(pixels);
+        copyPlanes(Pixmap(), 0, pixels, 0, layout.ResultPlanes(), cell);
         if (layout.selection)
-            hub.Host().ReadSelection(pixels, layout.SelectionPlane());
-        copyPlanes(Pixmap(), 0, pixels, 0, layout.SourcePlanes(), cell);
+        {
+            CMemoryPixmap selected(cell, layout.depth, 1);
+            hub.Host().ReadSelection(selected, 0);
+            copyPlanes(Pixmap(), layout.SelectionPlane(), selected, 0, 1, cell);
+        }
     }
     ++State(column, row);
     return 1;
