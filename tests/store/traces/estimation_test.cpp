@@ -142,11 +142,11 @@ TEST_F(Estimation, SenselessRequestsEndWithoutAResult)
 /// Waiting ends soon when somebody says so, however many traces wait for a worker.
 TEST_F(Estimation, CancelledWaitStopsAll)
 {
-    testPicture large(Blurred(700, 900, 31, 3), 0, 0);
+    testPicture large(Blurred(340, 380, 31, 3), 0, 0);
     PKernelCollection list(large, params, events, "");
     for (int i = 0; i < 8; ++i)
     {
-        auto trace = std::make_unique<PEstimatedKernel>(list, Sarnik::CRect{}, Settings(199));
+        auto trace = std::make_unique<PEstimatedKernel>(list, Sarnik::CRect{}, Settings(99));
         static_cast<PEstimatedKernel &>(list.Insert(std::move(trace), i)).StartEstimation(PEstimationRun::Background);
     }
     int asked = 0;
@@ -233,7 +233,7 @@ TEST_F(Estimation, RandomOrderOfOperations)
 
 TEST_F(Estimation, AutomaticRunHasALoneTrace)
 {
-    testPicture large(Blurred(700, 900, 15, 3), 7, 9);
+    testPicture large(Blurred(360, 440, 9, 3), 7, 9);
     PKernelCollection automatic(large, params, events, "");
     ASSERT_TRUE(automatic.AutoEstimate());
     EXPECT_EQ(automatic.Count(), 0);
@@ -251,9 +251,9 @@ TEST_F(Estimation, AutomaticRunHasALoneTrace)
     params.autoTraceCount = UINT32_MAX;
     automatic.AddAutoTraces();
     EXPECT_GE(automatic.Count(), 1);
-    EXPECT_LE(automatic.Count(), 30);
+    EXPECT_LE(automatic.Count(), 9);
     EXPECT_EQ(automatic.ActiveCount(), 1);
-    EXPECT_TRUE(large.Bounds().Contains(automatic.suggestRegionAt(400, 300)));
+    EXPECT_TRUE(large.Bounds().Contains(automatic.suggestRegionAt(200, 150)));
 
     testPicture flat(TestSupport::noiseImage(300, 300, 1, 0.5f, 0.5f), 0, 0);
     PKernelCollection nothing(flat, params, events, "");
