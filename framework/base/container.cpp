@@ -141,8 +141,8 @@ void CMemoryContainer::ReadBytes(std::span<std::byte> out)
 void CMemoryContainer::WriteBytes(std::span<const std::byte> in)
 {
     const std::size_t end = position + in.size();
-    if (end > bytes.capacity())
-        bytes.reserve((end + growth - 1) / growth * growth);
+    if (end > bytes.capacity()) // by half at least: a large kernel is written number by number
+        bytes.reserve((std::max(end, bytes.capacity() / 2 * 3) + growth - 1) / growth * growth);
     if (end > bytes.size())
         bytes.resize(end);
     std::copy(in.begin(), in.end(), bytes.begin() + static_cast<std::ptrdiff_t>(position));

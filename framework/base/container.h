@@ -51,7 +51,7 @@ private:
     bool swapBytes = false;
 };
 
-/// A container in memory that grows in blocks of 4096 bytes.
+/// A container in memory that grows in whole blocks of 4096 bytes.
 class CMemoryContainer final : public CContainer
 {
 public:

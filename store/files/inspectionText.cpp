@@ -18,32 +18,16 @@ using Platform::jsonNumber;
 using Platform::jsonObject;
 using Platform::jsonString;
 
-const char *ClassName(PKernelKind kind)
+struct kindNames
 {
-    switch (kind)
-    {
-    case PKernelKind::Estimated:
-        return "PEstimatedKernel";
-    case PKernelKind::Manual:
-        return "PManualKernel";
-    case PKernelKind::ReadOnly:
-        break;
-    }
-    return "PReadOnlyKernel";
-}
+    const char *className, *words;
+};
 
-const char *KindText(PKernelKind kind)
+const kindNames &NamesOf(PKernelKind kind)
 {
-    switch (kind)
-    {
-    case PKernelKind::Estimated:
-        return "estimated";
-    case PKernelKind::Manual:
-        return "a straight line";
-    case PKernelKind::ReadOnly:
-        break;
-    }
-    return "read-only";
+    static constexpr kindNames names[] = {
+        {"PEstimatedKernel", "estimated"}, {"PManualKernel", "a straight line"}, {"PReadOnlyKernel", "read-only"}};
+    return names[static_cast<std::uint32_t>(kind) - 1];
 }
 
 float Sum(const CorvaneDeblur::floatArray &kernel)
@@ -100,7 +84,7 @@ std::string JsonTrace(const PInspectedTrace &trace)
     if (trace.line)
         line = jsonArray({jsonNumber(trace.line->first.x), jsonNumber(trace.line->first.y),
                           jsonNumber(trace.line->second.x), jsonNumber(trace.line->second.y)});
-    return jsonObject({{"class", jsonString(ClassName(trace.kind))},
+    return jsonObject({{"class", jsonString(NamesOf(trace.kind).className)},
                        {"region", JsonRect(trace.region)},
                        {"settings", JsonSettings(trace.settings)},
                        {"kernel", JsonKernel(trace.kernel)},
@@ -156,7 +140,7 @@ const char *NoiseText(std::uint32_t level)
 
 std::string DescribeTrace(std::size_t number, const PInspectedTrace &trace)
 {
-    std::string out = Line("Trace %zu: %s", number, KindText(trace.kind));
+    std::string out = Line("Trace %zu: %s", number, NamesOf(trace.kind).words);
     const Sarnik::CRect &r = trace.region;
     if (r.Empty())
         out += Line("    region: the whole picture");
@@ -239,10 +223,11 @@ std::string KindLine(const PInspection &inspection)
 
 std::string DescribeInspection(const PInspection &inspection)
 {
+    const bool loaded = inspection.result || !inspection.traces.empty(); // the rest of a bad workspace counts, too
     std::string out = inspection.file + ": " + KindLine(inspection);
-    if (inspection.version && inspection.result)
+    if (inspection.version && loaded)
         out += ", version " + std::to_string(*inspection.version);
-    if (inspection.bounds && inspection.result)
+    if (inspection.bounds && loaded)
         out += ", for a picture of " + std::to_string(inspection.bounds->Width()) + " x " +
                std::to_string(inspection.bounds->Height()) + " pixels";
     out += "\n";
@@ -250,7 +235,7 @@ std::string DescribeInspection(const PInspection &inspection)
         out += inspection.error + "\n";
     if (inspection.preferences)
         out += DescribePreferences(inspection.preferences->parameters);
-    else if (inspection.result || !inspection.traces.empty())
+    else if (loaded)
         out += DescribeTraces(inspection);
     return out;
 }
