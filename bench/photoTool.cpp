@@ -1,14 +1,11 @@
-#include "bench/scenes.h"
-#include "host/pfm.h"
+#include "bench/photoFile.h"
 #include "host/photo.h"
-#include "host/photoWriter.h"
 
 #include <charconv>
 #include <cstdio>
 #include <cstring>
 #include <exception>
 #include <string>
-#include <vector>
 
 /// stillmark_bench_photo WIDTH HEIGHT OUT: makes a shaken photograph, RGB, 8 bits a sample unless OUT is a .pfm.
 /// stillmark_bench_photo PHOTO: prints the bytes of the decoded picture.
@@ -28,38 +25,6 @@ int parseSide(const char *text)
     return side;
 }
 
-/// Through a float map, which the host reads as a photo and saves as any other format.
-void makePhoto(int width, int height, const std::string &path)
-{
-    const std::string scratch = path + ".pfm";
-    {
-        const auto planes = Bench::shakenScene(height, width, 3, 45, 53);
-        floatRaster raster{width, height, 3, {}};
-        for (int y = 0; y < height; ++y)
-            for (int x = 0; x < width; ++x)
-                for (const auto &plane : planes)
-                    raster.samples.push_back(plane.row(y)[x]);
-        writePfm(scratch, raster);
-    }
-    struct removal
-    {
-        const std::string &file;
-        ~removal() { std::remove(file.c_str()); }
-    } const removeScratch{scratch};
-
-    const photo picture = photo::open(scratch);
-    photoWriter writer(picture, path);
-    const std::size_t rowBytes = static_cast<std::size_t>(width) * sizeof(float);
-    std::vector<float> row(static_cast<std::size_t>(width) * 3);
-    for (int y = 0; y < height; ++y)
-    {
-        const rectangle area{0, y, width, 1};
-        picture.read(area, row.data(), rowBytes);
-        writer.write(area, row.data(), rowBytes);
-    }
-    writer.commit();
-}
-
 void describePhoto(const std::string &path)
 {
     const photo picture = photo::open(path);
@@ -75,7 +40,7 @@ int main(int argc, char **argv)
     try
     {
         if (argc == 4)
-            makePhoto(parseSide(argv[1]), parseSide(argv[2]), argv[3]);
+            Bench::makePhoto(parseSide(argv[1]), parseSide(argv[2]), argv[3]);
         else if (argc == 2)
             describePhoto(argv[1]);
         else
