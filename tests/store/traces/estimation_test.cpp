@@ -166,15 +166,16 @@ TEST_F(Estimation, CancelledWaitStopsAll)
 /// them, and at most one estimation belongs to a trace.
 TEST_F(Estimation, RandomOrderOfOperations)
 {
-    const floatArray expected[2] = {Engine(left, 7), Engine(right, 9)};
-    const auto variant = [&](const PKernel &trace) { return trace.CommittedRegion() == left ? 0 : 1; };
+    const Sarnik::CRect one{60, 0, 100, 40}, other{120, 10, 170, 55}; // small: thousands of steps in seconds
+    const floatArray expected[2] = {Engine(one, 5), Engine(other, 7)};
+    const auto variant = [&](const PKernel &trace) { return trace.CommittedRegion() == one ? 0 : 1; };
     std::mt19937 random(11);
     const auto start = std::chrono::steady_clock::now();
     int steps = 0, finished = 0;
     for (; steps < 4000 && std::chrono::steady_clock::now() - start < 20s; ++steps)
     {
         if (traces.Count() < 4 && random() % 4 == 0)
-            Add(random() % 2 ? left : right, 3);
+            Add(random() % 2 ? one : other, 3);
         if (traces.Count() == 0)
             continue;
         const int index = static_cast<int>(random() % static_cast<unsigned>(traces.Count()));
@@ -186,8 +187,8 @@ TEST_F(Estimation, RandomOrderOfOperations)
         case 2:
         {
             const bool first = random() % 2;
-            trace.SetRegion(first ? left : right);
-            trace.Settings().size = first ? 7 : 9;
+            trace.SetRegion(first ? one : other);
+            trace.Settings().size = first ? 5 : 7;
             trace.StartEstimation(PEstimationRun::Background);
             break;
         }
