@@ -22,9 +22,21 @@ bool LoadWorkspace(PKernelCollection &collection, const std::string &path, PStre
         ReadHeader(collection, in);
         if (!collection.GetLastError().empty())
             return false;
-        ReadCollection(collection, in, indices);
-        collection.Events().WorkspaceLoaded();
-        collection.SetSavedMark(0);
+        // However the reading ends, the old traces are gone, and with them what could be undone.
+        const auto tell = [&] {
+            collection.Events().WorkspaceLoaded();
+            collection.SetSavedMark(0);
+        };
+        try
+        {
+            ReadCollection(collection, in, indices);
+        }
+        catch (...)
+        {
+            tell();
+            throw;
+        }
+        tell();
         return true;
     });
 }

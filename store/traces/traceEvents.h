@@ -77,7 +77,7 @@ public:
     /// A trace from a file is about to enter the list: whoever records inserts a copy of it as an undoable step. False
     /// where nobody does; the loader inserts it itself then.
     virtual bool AddLoadedTrace(const PKernel &, int /*at*/) { return false; }
-    /// A workspace has replaced all traces: nothing can be undone any more.
+    /// A workspace has replaced all traces, wholly read or not: nothing can be undone any more.
     virtual void WorkspaceLoaded() {}
 
     /// Several previews are shown side by side; nothing counts as selected meanwhile.
