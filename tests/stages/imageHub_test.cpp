@@ -259,6 +259,26 @@ TEST_F(ImageHub, RandomChangesNeverLeaveAnythingOld)
     }
 }
 
+TEST_F(ImageHub, WhatAJobFoundBeforeAChangeIsNeverShown)
+{
+    memoryHost host({{0, 0, 200, 150}, 8, 3, false, {}}, traces.collection);
+    for (const int pause : {0, 60}) // milliseconds: the job is under way, or done and not yet fetched
+    {
+        PImageHub hub(host);
+        hub.SetCellSize(96);
+        show(hub, {0, 0, 160, 120}, 1.0, {0, 0, 160, 120});
+        while (hub.Indicator() != 1)
+            ASSERT_TRUE(hub.Idle(0.001));
+        hub.Idle(0.001); // ends with a cell that is under way
+        std::this_thread::sleep_for(std::chrono::milliseconds(pause));
+        traces.collection.At(0)->Settings().smoothing = pause == 0 ? 0.9f : 0.1f;
+        hub.InvalidateResults(true, true, true);
+        while (hub.PreviewRough().RemainingAll() != 0)
+            hub.Idle(0.001);
+        expectNothingOld(hub, host);
+    }
+}
+
 class testWindow final : public PProgressWindow
 {
 public:
