@@ -52,6 +52,11 @@ void argumentParser::positional(const std::string &name, std::string &target, co
     app.add_option(name, target, about)->required()->type_name("");
 }
 
+void argumentParser::positionals(const std::string &name, std::vector<std::string> &target, const std::string &about)
+{
+    app.add_option(name, target, about)->required()->type_name("");
+}
+
 void argumentParser::required(const std::string &name, const std::string &valueName, std::string &target,
                               const std::string &about)
 {

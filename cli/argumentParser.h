@@ -23,6 +23,8 @@ public:
 
     void flag(const std::string &name, bool &target, const std::string &about);
     void positional(const std::string &name, std::string &target, const std::string &about);
+    /// One or more.
+    void positionals(const std::string &name, std::vector<std::string> &target, const std::string &about);
     void required(const std::string &name, const std::string &valueName, std::string &target, const std::string &about);
 
     /// An option with one value, which convert makes from its text.

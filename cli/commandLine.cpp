@@ -5,6 +5,7 @@
 #include <map>
 #include <ostream>
 #include <string_view>
+#include <tuple>
 
 namespace Stillmark
 {
@@ -17,6 +18,7 @@ const std::string subcommandList = R"(Other commands (stillmark COMMAND --help t
   suggest       find regions of a photo that suit an estimate
   measure       noise level and blur size of a photo
   line          make the kernel of a straight movement
+  inspect       tell what a file of traces, preferences or a recorded run holds
 
 A photo with the name of a command: ./estimate)";
 
@@ -52,11 +54,20 @@ void addStrength(argumentParser &parser, traceStrength &strength)
                  parsePercent);
 }
 
-int runRemove(argumentParser &parser, commandDelegate &delegate)
+std::string asIs(const std::string &text)
 {
-    removeOptions options;
-    addPhoto(parser, options.photo);
-    parser.required("-o,--output", "OUT", options.output, "the sharp picture; the extension chooses the format");
+    return text;
+}
+
+std::string endingIn(const std::string &text, const char *extension)
+{
+    if (!text.ends_with(extension))
+        throw usageError("'" + text + "' does not end in " + extension);
+    return text;
+}
+
+void addTraces(argumentParser &parser, removeOptions &options)
+{
     addSize(parser, options.size);
     addNoise(parser, options.noise);
     parser.values("--region", "X,Y,W,H", options.regions, "find the blur here; may be repeated (default: found)",
@@ -64,30 +75,93 @@ int runRemove(argumentParser &parser, commandDelegate &delegate)
     parser.value("--traces", "N", options.traces, "how many regions to find (default: 1)",
                  [](const std::string &text) { return parseInt(text, 1, 99); });
     addStrength(parser, options.strength);
-    bool plain = false;
-    parser.flag("--no-artifact-suppression", plain, "quicker, with more ringing (the Wiener method)");
     parser.flag("--force", options.force, "apply traces judged poor too");
-    parser.value("--kernel-picture", "F.png", options.kernelPicture, "a picture of the blur that was found",
-                 [](const std::string &text) {
-                     if (!text.ends_with(".png"))
-                         throw usageError("'" + text + "' does not end in .png");
-                     return text;
-                 });
+}
+
+/// Options that only one photo at a time can have.
+void addFiles(argumentParser &parser, removeOptions &options)
+{
     parser.value("--selection", "MASK", options.selection,
-                 "a picture of the photo's size: only where it is white the photo is looked at and changed",
-                 [](const std::string &text) { return text; });
-    addCommon(parser, options.common);
+                 "a picture of the photo's size: only where it is white the photo is looked at and changed", asIs);
+    parser.value("--kernel-picture", "F.png", options.kernelPicture, "a picture of the blur that was found",
+                 [](const std::string &text) { return endingIn(text, ".png"); });
+    parser.value("--workspace", "F.dbw", options.workspace, "remove the blur by the traces in this file", asIs);
+    parser.value("--save-workspace", "F.dbw", options.saveWorkspace, "keep the traces in this file",
+                 [](const std::string &text) { return endingIn(text, ".dbw"); });
+    parser.value("--replay", "F", options.replay, "repeat a recorded run", asIs);
+    parser.value("--record", "F", options.record, "record the run in this file", asIs);
+    parser.flag("--yes", options.yes, "answer questions with yes (default: no)");
+}
+
+/// Where the traces come from is told once.
+void checkOneSource(const removeOptions &options)
+{
+    const bool chosen = options.size || !options.regions.empty() || options.traces != 1 || options.force;
+    if (int{chosen} + !options.workspace.empty() + !options.replay.empty() > 1)
+        throw usageError("--workspace, --replay and options that choose traces (--size, --region, --traces, --force) "
+                         "exclude each other");
+    if (!options.replay.empty() && !options.artifactSuppression)
+        throw usageError("--no-artifact-suppression is part of what --replay repeats");
+}
+
+int runRemove(argumentParser &parser, commandDelegate &delegate)
+{
+    batchOptions options;
+    removeOptions &job = options.job;
+    std::pair<int, int> shard{0, 0};
+    bool plain = false;
+    parser.positionals("PHOTO", options.photos,
+                       "the picture: JPEG, PNG, TIFF, WebP, .pfm; with --out-dir many of them");
+    parser.value("-o,--output", "OUT", job.output, "the sharp picture; the extension chooses the format", asIs);
+    parser.value("--out-dir", "DIR", options.folder, "in place of OUT: the folder for the results of many photos",
+                 asIs);
+    parser.value("--shard", "I/N", shard, "with --out-dir: of every N photos only the I-th", parseShard);
+    addTraces(parser, job);
+    parser.flag("--no-artifact-suppression", plain, "quicker, with more ringing (the Wiener method)");
+    addFiles(parser, job);
+    addCommon(parser, job.common);
     if (!parser.parse())
         return exitDone;
-    options.artifactSuppression = !plain;
-    return delegate.remove(options);
+    job.artifactSuppression = !plain;
+    checkOneSource(job);
+
+    if (options.folder.empty())
+    {
+        if (job.output.empty())
+            throw usageError("--output is required");
+        if (options.photos.size() > 1)
+            throw usageError("several photos need --out-dir in place of --output");
+        if (shard.first != 0)
+            throw usageError("--shard goes with --out-dir");
+        job.photo = options.photos.front();
+        return delegate.remove(job);
+    }
+    if (!job.output.empty())
+        throw usageError("--output and --out-dir exclude each other");
+    if (!job.selection.empty() || !job.kernelPicture.empty() || !job.saveWorkspace.empty() || !job.record.empty())
+        throw usageError("--selection, --kernel-picture, --save-workspace and --record are for one photo");
+    if (shard.first != 0)
+        std::tie(options.shard, options.shards) = shard;
+    return delegate.removeAll(options);
+}
+
+int runInspect(argumentParser &parser, commandDelegate &delegate)
+{
+    inspectOptions options;
+    parser.positional("FILE", options.file, "a workspace .dbw, a trace .knl or .png, preferences, or a recorded run");
+    parser.value("--image-size", "WxH", options.imageSize,
+                 "load it as for a picture of this size (default: the size that the file says)", parseSize);
+    parser.value("--picture", "OUT.png", options.picture, "draw its kernels",
+                 [](const std::string &text) { return endingIn(text, ".png"); });
+    addCommon(parser, options.common);
+    return parser.parse() ? delegate.inspect(options) : exitDone;
 }
 
 int runEstimate(argumentParser &parser, commandDelegate &delegate)
 {
     estimateOptions options;
     addPhoto(parser, options.photo);
-    parser.required("-o,--output", "KERNEL", options.output, "the kernel: .pfm (exact) or .png");
+    parser.required("-o,--output", "KERNEL", options.output, "the kernel: .pfm (exact), .knl (a trace) or .png");
     parser.value("--region", "X,Y,W,H", options.region,
                  "find the blur here (default: the whole photo, of a large one a found region)", parseRectangle);
     addSize(parser, options.size);
@@ -108,7 +182,7 @@ int runDeconvolve(argumentParser &parser, commandDelegate &delegate)
 {
     deconvolveOptions options;
     addPhoto(parser, options.photo);
-    parser.values("--kernel", "K", options.kernels, "the blur, .pfm or a picture; may be repeated",
+    parser.values("--kernel", "K", options.kernels, "the blur, .pfm, .knl or a picture; may be repeated",
                   [](const std::string &text) { return text; });
     parser.required("-o,--output", "OUT", options.output, "the sharp picture; the extension chooses the format");
     parser.values("--region-of-kernel", "X,Y,W,H", options.kernelRegions,
@@ -175,13 +249,15 @@ struct subcommand
     int (*run)(argumentParser &, commandDelegate &);
 };
 
-const subcommand mainJob = {"PHOTO -o OUT [options]", "Removes camera shake from a photograph.", runRemove};
+const subcommand mainJob = {"PHOTO -o OUT [options], or PHOTO... --out-dir DIR [options]",
+                            "Removes camera shake from a photograph.", runRemove};
 
 const std::map<std::string_view, subcommand> subcommands = {
     {"estimate", {"PHOTO -o KERNEL [options]", "Finds the blur of a photo and saves it as a kernel.", runEstimate}},
     {"deconvolve", {"PHOTO --kernel K -o OUT [options]", "Removes a blur that is known.", runDeconvolve}},
     {"suggest", {"PHOTO [options]", "Finds regions of a photo that suit an estimate of its blur.", runSuggest}},
     {"measure", {"PHOTO [options]", "Measures the noise and the size of the blur.", runMeasure}},
+    {"inspect", {"FILE [options]", "Tells what a file of traces, preferences or a recorded run holds.", runInspect}},
     {"line", {"--length L --angle A -o KERNEL", "Makes the kernel of a straight movement.", runLine}},
 };
 

@@ -21,11 +21,13 @@ class commandDelegate
 public:
     virtual ~commandDelegate() = default;
     virtual int remove(const removeOptions &options) = 0;
+    virtual int removeAll(const batchOptions &options) = 0;
     virtual int estimate(const estimateOptions &options) = 0;
     virtual int deconvolve(const deconvolveOptions &options) = 0;
     virtual int suggest(const suggestOptions &options) = 0;
     virtual int measure(const measureOptions &options) = 0;
     virtual int line(const lineOptions &options) = 0;
+    virtual int inspect(const inspectOptions &options) = 0;
 };
 
 /// Parses the arguments, calls the one delegate function they ask for and returns its answer. A subcommand is named by

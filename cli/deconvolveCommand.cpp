@@ -3,6 +3,7 @@
 #include "cli/kernelArrays.h"
 #include "cli/photoRender.h"
 #include "cli/stopwatch.h"
+#include "cli/traceFiles.h"
 #include "cli/traceRegion.h"
 
 #include <algorithm>
@@ -37,7 +38,7 @@ commandResult deconvolvePhoto(const deconvolveOptions &options, runContext &cont
     photoWriter::check(options.output);
     std::vector<kernelSamples> kernels;
     for (const std::string &path : options.kernels)
-        kernels.push_back(readKernel(path));
+        kernels.push_back(readAnyKernel(path));
 
     const photo picture = openPhoto(options.photo, context);
     renderSettings settings;

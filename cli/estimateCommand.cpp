@@ -1,11 +1,11 @@
 #include "cli/commandLine.h"
 #include "cli/commands.h"
 #include "cli/jsonWriter.h"
-#include "cli/kernelArrays.h"
 #include "cli/optionValues.h"
 #include "cli/photoAnalysis.h"
 #include "cli/stopwatch.h"
 #include "cli/traceEstimation.h"
+#include "cli/traceFiles.h"
 #include "deblur/estimate/kernelPyramid.h"
 
 namespace Stillmark
@@ -61,7 +61,7 @@ std::string answerJson(const foundTrace &trace, double seconds)
 
 commandResult estimateKernel(const estimateOptions &options, runContext &context)
 {
-    checkKernelPath(options.output);
+    checkAnyKernelPath(options.output);
     const photo picture = openPhoto(options.photo, context);
     photoAnalysis analysis(picture, wholeOf(picture), context);
     const int size = options.size ? *options.size : analysis.blurSize(options.noise);
@@ -86,7 +86,8 @@ commandResult estimateKernel(const estimateOptions &options, runContext &context
         context.notes.push_back(picture.path() + ": region " + regionText(region) + ": " + complaint);
     if (trace.status != estimateStatus::finished)
         return {exitFailed, "", answerJson(trace, seconds)};
-    writeKernel(options.output, toSamples(trace.kernel));
+    writeAnyKernel(options.output, {region, size, options.noise, {}, false, trace.kernel}, picture.width(),
+                   picture.height());
     return {exitDone,
             options.output + ": a kernel of " + std::to_string(size) + " x " + std::to_string(size) +
                 " pixels, found in the region " + regionText(region) + " (" + secondsText(seconds) + ")",

@@ -52,7 +52,8 @@ std::string sentence(const hostAlert &alert)
     stopSignal::check();
     std::string reason = outcome.hostSentence();
     for (const hostAlert &alert : outcome.alerts)
-        reason += (reason.empty() ? "" : " ") + sentence(alert);
+        reason +=
+            (reason.empty() ? "" : " ") + sentence(alert) + (alert.kind == TNAlertYesNo ? " (--yes says yes)" : "");
     throw std::runtime_error(path + ": " + (reason.empty() ? "the filter has stopped" : reason));
 }
 
@@ -69,8 +70,7 @@ std::string pluginPath()
     throw Platform::fileError(places[0].string() + ": the plug-in is missing");
 }
 
-filterAnswer runFilter(const photo &picture, resultRaster &result, const selectionMask *selection,
-                       const recordedAction &action, runContext &context)
+filterAnswer runFilter(const photo &picture, resultRaster &result, const filterJob &job, runContext &context)
 {
     // Never unloaded: threads of the pool may still be leaving its code.
     static const pluginLibrary plugin(pluginPath());
@@ -78,13 +78,15 @@ filterAnswer runFilter(const photo &picture, resultRaster &result, const selecti
     photoSource source(picture);
     watchedResult written(result, context.bar);
     documentSettings shown;
-    shown.selection = selection;
+    shown.selection = job.selection;
     shown.profile = picture.profile();
     hostDocument document(source, &written, shown);
 
     hostOptions options;
     options.playing = true;
-    options.action = &action;
+    options.action = &job.action;
+    if (job.yes)
+        options.answers.assign(8, TNAnswerOk); // more than a run has questions
     options.abort = [] { return stopSignal::requested().load(); };
     options.progress = [&](std::int64_t done, std::int64_t total) {
         context.bar.set(static_cast<double>(done) / static_cast<double>(std::max<std::int64_t>(total, 1)));
@@ -97,7 +99,7 @@ filterAnswer runFilter(const photo &picture, resultRaster &result, const selecti
         fail(picture.path(), outcome);
     for (const hostAlert &alert : outcome.alerts)
         context.notes.push_back(picture.path() + ": " + sentence(alert));
-    return {outcome.recorded.value_or(action), written.untilFirst(), written.sinceFirst()};
+    return {outcome.recorded.value_or(job.action), written.untilFirst(), written.sinceFirst()};
 }
 
 } // namespace Stillmark

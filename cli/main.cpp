@@ -15,11 +15,16 @@ class program : public commandDelegate
 {
 public:
     int remove(const removeOptions &options) override { return run(options, removeBlur); }
+    int removeAll(const batchOptions &options) override
+    {
+        return runCommand(options.job.common, [&](runContext &context) { return removeBlurFromAll(options, context); });
+    }
     int estimate(const estimateOptions &options) override { return run(options, estimateKernel); }
     int deconvolve(const deconvolveOptions &options) override { return run(options, deconvolvePhoto); }
     int suggest(const suggestOptions &options) override { return run(options, suggestRegions); }
     int measure(const measureOptions &options) override { return run(options, measurePhoto); }
     int line(const lineOptions &options) override { return run(options, makeLine); }
+    int inspect(const inspectOptions &options) override { return run(options, inspectFile); }
 
 private:
     template <typename Options>

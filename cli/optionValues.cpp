@@ -113,6 +113,23 @@ std::pair<int, int> parsePoint(const std::string &text)
     return {(*v)[0], (*v)[1]};
 }
 
+std::pair<int, int> parseSize(const std::string &text)
+{
+    const std::size_t cross = text.find('x');
+    if (cross == std::string::npos)
+        throw usageError("'" + text + "' is no size (WxH)");
+    return {parseInt(text.substr(0, cross), 1, 2000000), parseInt(text.substr(cross + 1), 1, 2000000)};
+}
+
+std::pair<int, int> parseShard(const std::string &text)
+{
+    const std::size_t slash = text.find('/');
+    if (slash == std::string::npos)
+        throw usageError("'" + text + "' is no part of a whole (i/n)");
+    const int count = parseInt(text.substr(slash + 1), 1, 100000);
+    return {parseInt(text.substr(0, slash), 1, count), count};
+}
+
 CorvaneDeblur::noiseMode parseNoiseMode(const std::string &text)
 {
     using enum CorvaneDeblur::noiseMode;

@@ -34,6 +34,10 @@ int parseBlurSize(const std::string &text);
 rectangle parseRectangle(const std::string &text);
 /// "x,y", not negative.
 std::pair<int, int> parsePoint(const std::string &text);
+/// "WxH", both from 1 to 2000000.
+std::pair<int, int> parseSize(const std::string &text);
+/// "i/n": the i-th of n parts, 1 <= i <= n <= 100000.
+std::pair<int, int> parseShard(const std::string &text);
 /// auto, low, medium or high.
 CorvaneDeblur::noiseMode parseNoiseMode(const std::string &text);
 /// wiener, classic or fast.

@@ -41,6 +41,29 @@ struct removeOptions
     bool force = false;              ///< remove the blur even by traces judged poor
     std::string kernelPicture;       ///< empty: none
     std::string selection;           ///< a mask, white where the photo may change; empty: all of it
+    std::string workspace;           ///< traces to use; empty: none
+    std::string saveWorkspace;       ///< where the traces go; empty: nowhere
+    std::string replay;              ///< a recorded run to repeat; empty: none
+    std::string record;              ///< where the run is recorded; empty: nowhere
+    bool yes = false;                ///< the answer to questions; no: no
+};
+
+/// The main job for many photos.
+struct batchOptions
+{
+    removeOptions job; ///< without photo and output
+    std::vector<std::string> photos;
+    std::string folder;        ///< results have the photos' names there
+    int shard = 1, shards = 1; ///< every shards-th photo, from the shard-th on
+};
+
+/// What a file holds.
+struct inspectOptions
+{
+    commonOptions common;
+    std::string file;
+    std::optional<std::pair<int, int>> imageSize; ///< of the picture that it is loaded for; none: what the file says
+    std::string picture;                          ///< where its kernels are drawn; empty: nowhere
 };
 
 struct estimateOptions

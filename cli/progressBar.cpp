@@ -48,10 +48,16 @@ std::string progressBar::lineFor(const std::string &what, double done, double se
     return (what + bar + end).substr(0, static_cast<std::size_t>(std::max(0, columns - 1)));
 }
 
+void progressBar::prefix(const std::string &text)
+{
+    const std::lock_guard hold(lock);
+    before = text;
+}
+
 void progressBar::stage(const std::string &name)
 {
     const std::lock_guard hold(lock);
-    what = name;
+    what = before + name;
     done = 0;
     began = clock::now();
     paint();

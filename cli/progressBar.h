@@ -19,6 +19,8 @@ public:
     progressBar &operator=(const progressBar &) = delete;
     ~progressBar() { clear(); }
 
+    /// Stands in front of every stage from now on, such as "3/17 ".
+    void prefix(const std::string &text);
     /// Begins the next piece of work, such as "Reading".
     void stage(const std::string &what);
     /// Part of the stage that is done, 0 to 1; it never goes back. Any thread.
@@ -34,7 +36,7 @@ private:
 
     const bool visible;
     std::mutex lock; ///< guards all that follows
-    std::string what;
+    std::string before, what;
     double done = 0;
     clock::time_point began, painted;
     bool onScreen = false;

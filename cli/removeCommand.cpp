@@ -7,6 +7,7 @@
 #include "cli/runRecord.h"
 #include "cli/stopwatch.h"
 #include "cli/traceEstimation.h"
+#include "cli/traceFiles.h"
 #include "cli/tracePlan.h"
 #include "cli/traceRegion.h"
 #include "platform/files.h"
@@ -24,13 +25,18 @@ using CorvaneDeblur::estimateStatus;
 void checkTargets(const removeOptions &options)
 {
     photoWriter::check(options.output);
-    if (!options.kernelPicture.empty())
-        Platform::checkWritable(options.kernelPicture);
+    for (const std::string &path : {options.kernelPicture, options.record, options.saveWorkspace})
+        if (!path.empty())
+            Platform::checkWritable(path);
 }
 
 /// What the plug-in is asked to do.
 recordedAction actionFor(const removeOptions &options, const photo &picture, const rectangle &area, runContext &context)
 {
+    if (!options.replay.empty())
+        return recordedAction::read(options.replay);
+    if (!options.workspace.empty())
+        return workspaceAction(options.workspace, area.width, area.height, options.artifactSuppression, context.notes);
     if (isAutomatic(options, area))
         return automaticAction(options.artifactSuppression);
     const tracePlan plan = planTraces(options, picture, area, context);
@@ -41,14 +47,17 @@ recordedAction actionFor(const removeOptions &options, const photo &picture, con
 }
 
 /// What the plug-in found, judged.
-std::vector<foundTrace> judged(const std::vector<recordedTrace> &recorded)
+std::vector<foundTrace> judged(const std::vector<recordedTrace> &recorded, const removeOptions &options)
 {
+    const bool allWanted = options.replay.empty() && options.workspace.empty();
     std::vector<foundTrace> traces;
     for (const recordedTrace &trace : recorded)
     {
         foundTrace found = judgeTrace(trace.region, trace.size | 1, trace.kernel);
-        if (!trace.active && found.status == estimateStatus::finished && !found.point)
+        if (allWanted && !trace.active && found.status == estimateStatus::finished && !found.point)
             found.status = estimateStatus::noStructure; // why else the plug-in should have left it out
+        found.active = trace.active;
+        found.forced = trace.forced;
         traces.push_back(std::move(found));
     }
     return traces;
@@ -56,7 +65,8 @@ std::vector<foundTrace> judged(const std::vector<recordedTrace> &recorded)
 
 bool isApplied(const foundTrace &trace, const removeOptions &options)
 {
-    return isUsable(trace) || (options.force && trace.status == estimateStatus::finished);
+    const bool forced = options.force || trace.forced;
+    return trace.active && trace.status == estimateStatus::finished && (isUsable(trace) || forced);
 }
 
 /// Why the plug-in found nothing by itself.
@@ -152,9 +162,10 @@ commandResult removeBlur(const removeOptions &options, runContext &context)
 
     resultRaster result(picture, options.output);
     const recordedAction action = actionFor(options, picture, area, context);
-    const filterAnswer run = runFilter(picture, result, selection ? &*selection : nullptr, action, context);
-    const std::vector<foundTrace> traces = judged(tracesOf(run.recorded));
-    if (traces.empty() && isAutomatic(options, area))
+    const filterAnswer run =
+        runFilter(picture, result, {action, selection ? &*selection : nullptr, options.yes}, context);
+    const std::vector<foundTrace> traces = judged(tracesOf(run.recorded), options);
+    if (traces.empty() && options.replay.empty() && options.workspace.empty() && isAutomatic(options, area))
         noteNothingFound(picture, area, context);
     noteTraces(traces, options, context);
 
@@ -167,6 +178,10 @@ commandResult removeBlur(const removeOptions &options, runContext &context)
     }
     if (!options.kernelPicture.empty())
         writePictureOfKernels(options, traces, context);
+    if (!options.record.empty())
+        run.recorded.write(options.record);
+    if (!options.saveWorkspace.empty())
+        saveWorkspace(options.saveWorkspace, run.recorded, area.width, area.height);
     return answer(options, traces, run, context);
 }
 

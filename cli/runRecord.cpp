@@ -19,10 +19,9 @@ using namespace Project;
 using Sarnik::CMemoryContainer;
 
 constexpr std::uint32_t keyVersion = TN_CODE('a', 'c', 't', 'V'), keyAutomatic = TN_CODE('a', 'u', 't', 'K'),
-                        keyHeight = TN_CODE('i', 'm', 'g', 'H'), keyWidth = TN_CODE('i', 'm', 'g', 'W'),
-                        keyCount = TN_CODE('k', 'n', 'l', 'C'), keyActive = TN_CODE('a', 'p', 'p', 'K'),
-                        keyParameters = TN_CODE('s', 'e', 't', 'S'), keyFine = TN_CODE('f', 'R', 'e', 't'),
-                        keyTraces = TN_CODE('k', 'n', 'l', 'M');
+                        keyFullAutomatic = TN_CODE('f', 'u', 'l', 'A'), keyHeight = TN_CODE('i', 'm', 'g', 'H'),
+                        keyWidth = TN_CODE('i', 'm', 'g', 'W'), keyParameters = TN_CODE('s', 'e', 't', 'S'),
+                        keyFine = TN_CODE('f', 'R', 'e', 't'), keyTraces = TN_CODE('k', 'n', 'l', 'M');
 
 std::vector<std::uint8_t> bytesOf(const CMemoryContainer &container)
 {
@@ -60,16 +59,13 @@ recordedTrace fromRecord(const PTraceRecord &record)
     return trace;
 }
 
-CMemoryContainer streamOf(const std::vector<recordedTrace> &traces)
+CMemoryContainer streamOfTraces(const std::vector<recordedTrace> &traces)
 {
     CMemoryContainer stream;
     stream.WriteU32(static_cast<std::uint32_t>(traces.size()));
     stream.WriteI32(-1); // none is selected
     for (const recordedTrace &trace : traces)
-    {
-        stream.WriteU32(static_cast<std::uint32_t>(PKernelKind::Estimated));
-        WriteCommonRecord(stream, toRecord(trace));
-    }
+        writeTrace(trace, stream);
     stream.WriteU32(static_cast<std::uint32_t>(
         std::count_if(traces.begin(), traces.end(), [](const auto &t) { return t.active; })));
     for (std::uint32_t i = 0; i < traces.size(); ++i)
@@ -79,7 +75,15 @@ CMemoryContainer streamOf(const std::vector<recordedTrace> &traces)
     return stream;
 }
 
-void finish(recordedAction &action, bool artifactSuppression, const std::vector<recordedTrace> &traces)
+recordedAction begin(bool automatic, int version)
+{
+    recordedAction action;
+    action.put(keyVersion, std::int32_t{version});
+    action.put(keyAutomatic, automatic);
+    return action;
+}
+
+void finish(recordedAction &action, bool artifactSuppression, std::vector<std::uint8_t> stream)
 {
     CMemoryContainer parameters;
     PParams record;
@@ -87,7 +91,7 @@ void finish(recordedAction &action, bool artifactSuppression, const std::vector<
     WriteParameters(parameters, record);
     action.put(keyParameters, bytesOf(parameters));
     action.put(keyFine, artifactSuppression);
-    action.put(keyTraces, bytesOf(streamOf(traces)));
+    action.put(keyTraces, std::move(stream));
 }
 
 std::vector<recordedTrace> readStream(CMemoryContainer &stream)
@@ -112,35 +116,48 @@ std::vector<recordedTrace> readStream(CMemoryContainer &stream)
 
 } // namespace
 
+void writeTrace(const recordedTrace &trace, Sarnik::CContainer &out)
+{
+    out.WriteU32(static_cast<std::uint32_t>(PKernelKind::Estimated));
+    WriteCommonRecord(out, toRecord(trace));
+}
+
 recordedAction automaticAction(bool artifactSuppression)
 {
-    recordedAction action;
-    action.put(keyVersion, std::int32_t{kNewestTraceVersion});
-    action.put(keyAutomatic, true);
-    finish(action, artifactSuppression, {});
+    recordedAction action = begin(true, kNewestTraceVersion);
+    action.put(keyFullAutomatic, true);
+    finish(action, artifactSuppression, bytesOf(streamOfTraces({})));
+    return action;
+}
+
+recordedAction actionOfStream(std::vector<std::uint8_t> stream, int version, int width, int height,
+                              bool artifactSuppression)
+{
+    recordedAction action = begin(false, version);
+    action.put(keyHeight, height);
+    action.put(keyWidth, width);
+    finish(action, artifactSuppression, std::move(stream));
     return action;
 }
 
 recordedAction actionWith(const std::vector<recordedTrace> &traces, int width, int height, bool artifactSuppression)
 {
-    recordedAction action;
-    action.put(keyVersion, std::int32_t{kNewestTraceVersion});
-    action.put(keyAutomatic, false);
-    action.put(keyHeight, height);
-    action.put(keyWidth, width);
-    action.put(keyCount, static_cast<std::int32_t>(traces.size()));
-    action.put(keyActive, static_cast<std::int32_t>(traces.size()));
-    finish(action, artifactSuppression, traces);
-    return action;
+    return actionOfStream(bytesOf(streamOfTraces(traces)), kNewestTraceVersion, width, height, artifactSuppression);
+}
+
+std::vector<std::uint8_t> streamOf(const recordedAction &action)
+{
+    const recordedAction::value *value = action.find(keyTraces);
+    const auto *bytes = value != nullptr ? std::get_if<std::vector<std::uint8_t>>(value) : nullptr;
+    return bytes != nullptr ? *bytes : std::vector<std::uint8_t>();
 }
 
 std::vector<recordedTrace> tracesOf(const recordedAction &action)
 {
-    const recordedAction::value *value = action.find(keyTraces);
-    const auto *bytes = value != nullptr ? std::get_if<std::vector<std::uint8_t>>(value) : nullptr;
-    if (bytes == nullptr)
+    const std::vector<std::uint8_t> bytes = streamOf(action);
+    if (bytes.empty())
         throw std::runtime_error("the recorded run holds no traces");
-    CMemoryContainer stream(std::as_bytes(std::span(*bytes)));
+    CMemoryContainer stream(std::as_bytes(std::span(bytes)));
     try
     {
         return readStream(stream);

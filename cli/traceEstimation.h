@@ -32,6 +32,8 @@ struct foundTrace
     bool point = false; ///< finished, and says that nothing moved
     bool cut = false;   ///< finished, and runs into the border of its square: the blur is longer than `size`
     int levels = 0;
+    bool active = true;  ///< wanted in the result
+    bool forced = false; ///< wanted whatever it is judged
 };
 
 /// Estimates a kernel of size x size in each region, several at a time; the results are in the regions' order and do

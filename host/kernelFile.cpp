@@ -3,6 +3,7 @@
 #include "host/greyPng.h"
 #include "host/pfm.h"
 #include "host/photo.h"
+#include "host/textRaster.h"
 #include "platform/files.h"
 
 #include <algorithm>
@@ -68,6 +69,45 @@ bool endsIn(const std::string &path, const char *extension)
     return end == extension;
 }
 
+struct greyCanvas
+{
+    int width, height;
+    std::vector<std::uint8_t> samples;
+
+    std::uint8_t &at(int x, int y)
+    {
+        return samples[static_cast<std::size_t>(y) * static_cast<std::size_t>(width) + static_cast<std::size_t>(x)];
+    }
+};
+
+void draw(const kernelSamples &kernel, int scale, int left, int top, greyCanvas &canvas)
+{
+    constexpr float gamma = 0.6f; // raises the faint ends of a path without burning out its middle
+    const float peak = kernel.samples.empty() ? 0 : *std::max_element(kernel.samples.begin(), kernel.samples.end());
+    for (int y = 0; y < kernel.rows * scale; ++y)
+        for (int x = 0; x < kernel.cols * scale; ++x)
+        {
+            const std::size_t at = static_cast<std::size_t>(y / scale) * static_cast<std::size_t>(kernel.cols) +
+                                   static_cast<std::size_t>(x / scale);
+            const float v = kernel.samples[at] > 0 ? kernel.samples[at] / peak : 0;
+            canvas.at(left + x, top + y) =
+                static_cast<std::uint8_t>(std::lround(255 * std::pow(std::min(v, 1.0f), gamma)));
+        }
+}
+
+/// White on the canvas.
+void draw(const textRaster &text, int left, int top, greyCanvas &canvas)
+{
+    for (int y = 0; y < text.height; ++y)
+        for (int x = 0; x < text.width; ++x)
+        {
+            const int cover = text.coverage[static_cast<std::size_t>(y) * static_cast<std::size_t>(text.width) +
+                                            static_cast<std::size_t>(x)];
+            std::uint8_t &sample = canvas.at(left + x, top + y);
+            sample = static_cast<std::uint8_t>(sample + (255 - sample) * cover / 255);
+        }
+}
+
 } // namespace
 
 kernelSamples readKernel(const std::string &path)
@@ -118,39 +158,41 @@ void writeKernel(const std::string &path, const kernelSamples &kernel)
     writeGreyPng(path, kernel.cols, kernel.rows, codes);
 }
 
-void writeKernelPicture(const std::string &path, const std::vector<kernelSamples> &kernels)
+void writeKernelPicture(const std::string &path, const std::vector<kernelSamples> &kernels,
+                        const std::vector<std::string> &captions)
 {
     constexpr int side = 256, gap = 8;
     constexpr std::uint8_t background = 64;
-    constexpr float gamma = 0.6f; // raises the faint ends of a path without burning out its middle
     const auto enlargement = [](const kernelSamples &k) { return std::max(1, side / std::max({k.rows, k.cols, 1})); };
 
-    int width = gap, height = 0;
-    for (const kernelSamples &k : kernels)
+    std::vector<textRaster> texts;
+    for (const std::string &caption : captions)
+        texts.push_back(renderText(caption));
+    int width = gap, kernelHeight = 0, textHeight = 0;
+    for (std::size_t i = 0; i < kernels.size(); ++i)
     {
-        width += k.cols * enlargement(k) + gap;
-        height = std::max(height, k.rows * enlargement(k));
+        const kernelSamples &k = kernels[i];
+        const int textWidth = texts.empty() ? 0 : texts[i].width;
+        width += std::max(k.cols * enlargement(k), textWidth) + gap;
+        kernelHeight = std::max(kernelHeight, k.rows * enlargement(k));
+        textHeight = std::max(textHeight, texts.empty() ? 0 : texts[i].height + gap);
     }
-    height += 2 * gap;
-    std::vector<std::uint8_t> canvas(static_cast<std::size_t>(width) * static_cast<std::size_t>(height), background);
+    const int height = kernelHeight + textHeight + 2 * gap;
+    greyCanvas canvas{width, height, {}};
+    canvas.samples.assign(static_cast<std::size_t>(width) * static_cast<std::size_t>(height), background);
     int left = gap;
-    for (const kernelSamples &k : kernels)
+    for (std::size_t i = 0; i < kernels.size(); ++i)
     {
-        const int scale = enlargement(k);
-        const float peak = k.samples.empty() ? 0 : *std::max_element(k.samples.begin(), k.samples.end());
-        for (int y = 0; y < k.rows * scale; ++y)
-            for (int x = 0; x < k.cols * scale; ++x)
-            {
-                const std::size_t at = static_cast<std::size_t>(y / scale) * static_cast<std::size_t>(k.cols) +
-                                       static_cast<std::size_t>(x / scale);
-                const float v = k.samples[at] > 0 ? k.samples[at] / peak : 0;
-                canvas[static_cast<std::size_t>(gap + y) * static_cast<std::size_t>(width) +
-                       static_cast<std::size_t>(left + x)] =
-                    static_cast<std::uint8_t>(std::lround(255 * std::pow(std::min(v, 1.0f), gamma)));
-            }
-        left += k.cols * scale + gap;
+        draw(kernels[i], enlargement(kernels[i]), left, gap, canvas);
+        int used = kernels[i].cols * enlargement(kernels[i]);
+        if (!texts.empty())
+        {
+            draw(texts[i], left, 2 * gap + kernelHeight, canvas);
+            used = std::max(used, texts[i].width);
+        }
+        left += used + gap;
     }
-    writeGreyPng(path, width, height, canvas);
+    writeGreyPng(path, width, height, canvas.samples);
 }
 
 } // namespace Stillmark

@@ -23,11 +23,16 @@ std::string SizeText(std::int64_t width, std::int64_t height)
 void WriteHeader(const PKernelCollection &collection, Sarnik::CContainer &out)
 {
     const Sarnik::CRect bounds = collection.Picture().Bounds();
+    WriteHeader(static_cast<std::int32_t>(bounds.Width()), static_cast<std::int32_t>(bounds.Height()), out);
+}
+
+void WriteHeader(std::int32_t width, std::int32_t height, Sarnik::CContainer &out)
+{
     out.WriteU32(kSignature);
     out.WriteU32(kVersionSignature);
     out.WriteU16(kNewestTraceVersion);
-    out.WriteI32(static_cast<std::int32_t>(bounds.Width()));
-    out.WriteI32(static_cast<std::int32_t>(bounds.Height()));
+    out.WriteI32(width);
+    out.WriteI32(height);
 }
 
 void ReadHeader(PKernelCollection &collection, Sarnik::CContainer &in)

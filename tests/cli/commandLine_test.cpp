@@ -21,16 +21,18 @@ namespace
 class recordingDelegate : public commandDelegate
 {
 public:
-    std::variant<std::monostate, removeOptions, estimateOptions, deconvolveOptions, suggestOptions, measureOptions,
-                 lineOptions>
+    std::variant<std::monostate, removeOptions, batchOptions, estimateOptions, deconvolveOptions, suggestOptions,
+                 measureOptions, lineOptions, inspectOptions>
         asked;
 
     int remove(const removeOptions &o) override { return keep(o); }
+    int removeAll(const batchOptions &o) override { return keep(o); }
     int estimate(const estimateOptions &o) override { return keep(o); }
     int deconvolve(const deconvolveOptions &o) override { return keep(o); }
     int suggest(const suggestOptions &o) override { return keep(o); }
     int measure(const measureOptions &o) override { return keep(o); }
     int line(const lineOptions &o) override { return keep(o); }
+    int inspect(const inspectOptions &o) override { return keep(o); }
 
 private:
     template <typename Options> int keep(const Options &o)
@@ -137,13 +139,30 @@ TEST(CommandLine, FirstWordChoosesTheCommand)
     EXPECT_EQ(l.angle, -30);
 }
 
+TEST(CommandLine, ManyPhotosShareTheOptions)
+{
+    const auto o = optionsOf<batchOptions>("a.jpg b.jpg --out-dir out --shard 2/3 --smoothing 50 c.jpg");
+    EXPECT_EQ(o.photos, (std::vector<std::string>{"a.jpg", "b.jpg", "c.jpg"}));
+    EXPECT_EQ(o.folder, "out");
+    EXPECT_EQ(std::make_pair(o.shard, o.shards), std::make_pair(2, 3));
+    EXPECT_FLOAT_EQ(o.job.strength.smoothing, 0.5f);
+    EXPECT_EQ(optionsOf<inspectOptions>("inspect a.dbw --image-size 30x20").imageSize, std::make_pair(30, 20));
+}
+
 TEST(CommandLine, WrongUsageIsToldInOneLineAndAnswersTwo)
 {
     const std::string whole = "p.jpg -o o.jpg ";
     const std::pair<std::string, const char *> cases[] = {
         {"", "PHOTO"},
         {"p.jpg", "--output"},
-        {"p.jpg q.jpg -o o.jpg", "q.jpg"},
+        {"p.jpg q.jpg -o o.jpg", "--out-dir"},
+        {whole + "--out-dir d", "--out-dir"},
+        {whole + "--shard 1/2", "--shard"},
+        {"p.jpg --out-dir d --shard 3/2", "3"},
+        {"p.jpg --out-dir d --record r", "--record"},
+        {whole + "--replay r --size 9", "--replay"},
+        {whole + "--replay r --workspace w.dbw", "--workspace"},
+        {"inspect a.dbw --image-size 30", "30"},
         {"p.jpg -o", "--output"},
         {whole + "--sizes 9", "--sizes"},
         {whole + "--size 44", "44"},

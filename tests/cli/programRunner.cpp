@@ -94,9 +94,10 @@ void watch(programRun &run, pid_t child, const std::array<int, 2> &ends, const r
 programRun runProgram(const std::filesystem::path &folder, const std::vector<std::string> &arguments,
                       const runRules &rules)
 {
-    // One cache of tables for all tests, away from the user's.
-    static const temporaryFolder cache;
-    setenv("XDG_CACHE_HOME", cache.path().c_str(), 1);
+    // One folder for tables and preferences of all tests, away from the user's.
+    static const temporaryFolder own;
+    setenv("XDG_CACHE_HOME", own.path().c_str(), 1);
+    setenv("XDG_CONFIG_HOME", own.path().c_str(), 1);
 
     const outputPipe out, err;
     const pid_t child = fork();

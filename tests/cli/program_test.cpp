@@ -10,6 +10,7 @@
 #include <signal.h>
 
 #include <cmath>
+#include <cstdlib>
 #include <iterator>
 #include <limits>
 #include <sstream>
@@ -215,6 +216,92 @@ TEST_F(Program, MeasuresAndSuggests)
     const programRun suggested = run("suggest in.png --count 2 --json");
     EXPECT_EQ(suggested.status, 0) << suggested.err;
     EXPECT_THAT(suggested.out, MatchesRegex("\\{\"regions\": \\[(\\[[0-9]+, [0-9]+, [0-9]+, [0-9]+\\](, )?)+\\]\\}\n"));
+}
+
+TEST_F(Program, RecordsAndRepeatsARun)
+{
+    const floatArray kernel = shakeKernel(15, 15, 6);
+    writeGrey(folder.file("in.png"), blurred(edgeScene(360, 400, 5), kernel, 0.002f, 7));
+    writeGrey(folder.file("other.png"), blurred(edgeScene(300, 340, 8), kernel, 0.002f, 9));
+    const auto done = [&](const std::string &line) {
+        const programRun result = run(line);
+        EXPECT_EQ(result.status, 0) << line << ": " << result.err;
+        return result.out + result.err;
+    };
+    done("in.png -o out.png --size 19 --region 20,20,300,300 --record r --save-workspace w.dbw");
+    const std::string bytes = bytesOf(folder.file("out.png"));
+    for (const char *again : {"--replay r", "--workspace w.dbw"})
+    {
+        done(std::string("in.png -o again.png ") + again);
+        EXPECT_TRUE(bytesOf(folder.file("again.png")) == bytes) << again;
+    }
+
+    // On another size the user is asked, and a run that found everything by itself does so again.
+    const programRun asked = run("other.png -o again.png --replay r");
+    EXPECT_EQ(asked.status, 1);
+    EXPECT_THAT(asked.err, HasSubstr("different from the current image"));
+    done("other.png -o again.png --replay r --yes");
+    EXPECT_THAT(run("other.png -o again.png --workspace w.dbw").err,
+                HasSubstr("Value in the loaded file: 400x360 Value of the current image: 340x300"));
+    done("in.png -o out.png --record automatic");
+    done("other.png -o again.png --replay automatic");
+
+    EXPECT_THAT(done("inspect r"), HasSubstr("trace in 20,20,300,300, size 19, good"));
+    EXPECT_THAT(done("inspect w.dbw --json"), HasSubstr("\"region\": [20, 20, 320, 320]"));
+    EXPECT_THAT(run("inspect w.dbw --image-size 40x30").err + run("inspect w.dbw --image-size 40x30").out,
+                HasSubstr("Image size doesn't match."));
+
+    // A trace file is a kernel like any other.
+    done("estimate in.png -o k.knl --size 19");
+    done("estimate in.png -o k.pfm --size 19");
+    done("deconvolve in.png --kernel k.knl -o a.png");
+    done("deconvolve in.png --kernel k.pfm -o b.png");
+    EXPECT_LT(distanceBetween(readGrey(folder.file("a.png")), readGrey(folder.file("b.png"))), 1e-9);
+}
+
+TEST_F(Program, DoesManyPhotosAndNoneTwice)
+{
+    for (int i = 0; i < 3; ++i)
+        writeGrey(folder.file("p" + std::to_string(i) + ".png"),
+                  blurred(edgeScene(200, 220, 5 + static_cast<unsigned>(i)), shakeKernel(11, 11, 6), 0.002f, 7));
+    writeBytes(folder.file("p3.png"), "no picture");
+    for (const char *name : {"all", "shards", "other"})
+        std::filesystem::create_directory(folder.path() / name);
+    const programRun all = run("p0.png p1.png p3.png p2.png --out-dir all");
+    EXPECT_EQ(all.status, 1);
+    EXPECT_THAT(all.out, HasSubstr("3 of 4 photos done"));
+    EXPECT_THAT(all.err, HasSubstr("failed: p3.png"));
+
+    // Two tasks of a job array do each photo once between them.
+    const std::string script = STILLMARK_SAMPLES "/jobArray.sh";
+    for (const char *task : {"1", "2"})
+    {
+        ::setenv("TASK", task, 1);
+        const std::string command = "cd '" + folder.path().string() +
+                                    "' && mkdir -p in && cp p[012].png in && TASKS=2 " +
+                                    "STILLMARK='" STILLMARK_BINARY "' sh '" + script + "' in shards";
+        EXPECT_EQ(std::system(command.c_str()), 0);
+    }
+    for (int i = 0; i < 3; ++i)
+    {
+        const std::string name = "/p" + std::to_string(i) + ".png";
+        EXPECT_TRUE(bytesOf(folder.file("all" + name)) == bytesOf(folder.file("shards" + name))) << name;
+    }
+    expectFailure("p0.png ./p0.png --out-dir other", "p0.png");
+    expectFailure("p0.png --out-dir .", "replace");
+}
+
+TEST_F(Program, KilledLeavesNoPageFile)
+{
+    std::filesystem::create_directory(folder.path() / "scratch");
+    ::setenv("TMPDIR", folder.file("scratch").c_str(), 1);
+    writeGrey(folder.file("in.pfm"), edgeScene(1000, 1200, 5));
+    const programRun killed = run("in.pfm -o out.png --size 99 --region 0,0,1000,1000",
+                                  {.signalAfter = std::chrono::milliseconds(500), .signals = {SIGKILL}});
+    ::unsetenv("TMPDIR");
+    EXPECT_EQ(killed.status, -1);
+    EXPECT_TRUE(std::filesystem::is_empty(folder.path() / "scratch"));
+    EXPECT_EQ(bytesOf(folder.file("out.png")), oldOutput);
 }
 
 /// Long jobs, each in another part of the program.
