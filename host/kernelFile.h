@@ -28,7 +28,7 @@ void checkKernelPath(const std::string &path);
 void writeKernel(const std::string &path, const kernelSamples &kernel);
 
 /// A PNG to look at: the kernels side by side, enlarged to about 256 pixels each with square pixels left visible, and
-/// faint parts raised. captions: what is written below each, as many as kernels, or none.
+/// faint parts raised. captions: what is written below each (as many as kernels); none: no text.
 void writeKernelPicture(const std::string &path, const std::vector<kernelSamples> &kernels,
                         const std::vector<std::string> &captions = {});
 
