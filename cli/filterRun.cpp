@@ -1,5 +1,6 @@
 #include "cli/filterRun.h"
 
+#include "cli/settingsFolder.h"
 #include "cli/stopSignal.h"
 #include "cli/stopwatch.h"
 #include "host/document/hostDocument.h"
@@ -72,6 +73,7 @@ std::string pluginPath()
 
 filterAnswer runFilter(const photo &picture, resultRaster &result, const filterJob &job, runContext &context)
 {
+    const settingsFolder settings;
     // Never unloaded: threads of the pool may still be leaving its code.
     static const pluginLibrary plugin(pluginPath());
 
