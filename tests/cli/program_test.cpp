@@ -293,9 +293,10 @@ TEST_F(Program, DoesManyPhotosAndNoneTwice)
 
 TEST_F(Program, KilledLeavesNoPageFile)
 {
+    writeGrey(folder.file("in.pfm"), edgeScene(1000, 1200, 5));
+    run("--version"); // what the tests themselves need of temporary folders is made by the first run
     std::filesystem::create_directory(folder.path() / "scratch");
     ::setenv("TMPDIR", folder.file("scratch").c_str(), 1);
-    writeGrey(folder.file("in.pfm"), edgeScene(1000, 1200, 5));
     const programRun killed = run("in.pfm -o out.png --size 99 --region 0,0,1000,1000",
                                   {.signalAfter = std::chrono::milliseconds(500), .signals = {SIGKILL}});
     ::unsetenv("TMPDIR");
