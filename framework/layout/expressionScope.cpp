@@ -24,15 +24,12 @@ std::uint32_t CExpressionScope::Hash(std::string_view name)
 
 void CExpressionScope::Define(std::string_view name, const CExpressionValue &value, std::size_t position)
 {
-    if (!buckets)
-        buckets = std::make_unique<table>();
+    if (!variables)
+        variables = std::make_unique<table>();
     const std::uint32_t hash = Hash(name);
-    const definition *&bucket = (*buckets)[hash % bucketCount];
-    CExpressionValue kept = value;
-    if (kept.text)
-        kept.text = pool.Copy(*kept.text);
-    definitions.push_back({pool.Copy(name), kept, hash, position, bucket});
-    bucket = &definitions.back();
+    const definition *&bucket = variables->buckets[hash % bucketCount];
+    variables->definitions.push_back({pool.Copy(name), value, hash, position, bucket});
+    bucket = &variables->definitions.back();
 }
 
 const CExpressionValue *CExpressionScope::Find(std::string_view name, std::size_t at) const
@@ -40,9 +37,9 @@ const CExpressionValue *CExpressionScope::Find(std::string_view name, std::size_
     const std::uint32_t hash = Hash(name);
     for (const CExpressionScope *scope = this; scope != nullptr; scope = scope->parent)
     {
-        if (!scope->buckets)
+        if (!scope->variables)
             continue;
-        for (const definition *d = (*scope->buckets)[hash % bucketCount]; d != nullptr; d = d->next)
+        for (const definition *d = scope->variables->buckets[hash % bucketCount]; d != nullptr; d = d->next)
             if (d->hash == hash && d->position <= at && d->name == name)
                 return &d->value;
     }

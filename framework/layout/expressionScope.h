@@ -33,7 +33,8 @@ public:
     /// Whether expressions may compare, and use `&&`, `||` and `in`.
     virtual bool LogicAllowed() const { return false; }
 
-    /// Name and text are copied to the pool. Positions never decrease from one call to the next.
+    /// The name is copied to the pool; a text is in it already, or lives as long: handing one long text on from name to
+    /// name costs nothing. Positions never decrease from one call to the next.
     void Define(std::string_view name, const CExpressionValue &value, std::size_t position = 0);
 
     /// The last definition that stands no later in the text, here or further out; null if there is none.
@@ -54,12 +55,15 @@ private:
         std::size_t position;
         const definition *next; ///< an older one in the same bucket
     };
-    using table = std::array<const definition *, bucketCount>;
+    struct table
+    {
+        std::array<const definition *, bucketCount> buckets{};
+        std::deque<definition> definitions; // stay where they are as it grows
+    };
 
     CStringPool &pool;
     const CExpressionScope *parent;
-    std::deque<definition> definitions;
-    std::unique_ptr<table> buckets; ///< none before the first definition
+    std::unique_ptr<table> variables; ///< none before the first definition
 };
 
 } // namespace Sarnik

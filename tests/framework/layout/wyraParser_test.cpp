@@ -27,12 +27,13 @@ private:
 TEST(WyraParser, PropertiesAreIntegersAndTexts)
 {
     const Head head("code = 'Abcd'; again = code; n = 3; Box(a: 'Abcd', b: again, c: 'Abcde', d: n + n, e: '',"
-                    " f: '0.001', g: 1, g: 2, h: '$$$/K=a \n& b', i: '1e999', k: n, l: (code) + 0, m: '12') ;");
+                    " f: '0.001', g: 1, g: 2, h: '$$$/K=a \n& b', i: '1e999', k: n, l: (code) + 0, m: '12', o: code) ;");
     const auto properties = head();
     EXPECT_EQ(properties.Integer("a"), 0x41626364);
     EXPECT_EQ(properties.Text("a"), "Abcd");
     EXPECT_EQ(properties.Integer("b"), 0x41626364); // a lone name hands on both, an expression the integer alone
     EXPECT_EQ(properties.Text("b"), "Abcd");
+    EXPECT_EQ(properties.Text("b").data(), properties.Text("o").data()); // never copied: it may be very long
     EXPECT_EQ(properties.Integer("l"), 0x41626364);
     EXPECT_EQ(properties.Text("l"), "");
     EXPECT_EQ(properties.Integer("c", -1), -1);
