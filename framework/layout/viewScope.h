@@ -18,7 +18,10 @@ class CExpressViewScope final : public CExpressionScope
 {
 public:
     /// The outermost scope of a text, which is no view.
-    explicit CExpressViewScope(const CExpressionScope &constants) : CExpressionScope(constants.Pool(), &constants) {}
+    CExpressViewScope(CStringPool &stringPool, const CExpressionScope &constants)
+        : CExpressionScope(stringPool, &constants)
+    {
+    }
     /// A view that stands at a position of the text, in another's body.
     CExpressViewScope(const CExpressViewScope &enclosing, std::string_view viewClassName, std::size_t at)
         : CExpressionScope(enclosing.Pool(), &enclosing), className(viewClassName), position(at)

@@ -187,10 +187,20 @@ void parser::View(CExpressViewScope &enclosing)
 
 } // namespace
 
-CWyraDefinition::CWyraDefinition() : constants(pool), file(constants)
+const CExpressionScope &CWyraDefinition::Constants()
 {
-    for (const CLayoutConstant &constant : LayoutConstants())
-        constants.Define(constant.name, {constant.value, {}});
+    struct filledScope
+    {
+        filledScope()
+        {
+            for (const CLayoutConstant &constant : LayoutConstants())
+                scope.Define(constant.name, {constant.value, {}});
+        }
+        CStringPool pool;
+        CExpressionScope scope{pool};
+    };
+    static const filledScope constants;
+    return constants.scope;
 }
 
 std::unique_ptr<CWyraDefinition> ParseLayout(std::string_view text, CGenerator *generator, CWyraListener *listener)

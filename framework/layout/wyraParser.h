@@ -19,13 +19,14 @@ struct CWyraLimits
     static constexpr int views = 4000, depth = 64, variables = 4000;
 };
 
-/// A parsed layout: the constants, the scope of the text with its one view, and all their strings.
+/// A parsed layout: the scope of the text with its one view, and all its strings.
 class CWyraDefinition
 {
 public:
-    CWyraDefinition();
+    CWyraDefinition() : file(pool, Constants()) {}
 
-    CExpressionScope &Constants() { return constants; }
+    /// The scope of the constants, outermost of all; the same for every layout. Any thread.
+    static const CExpressionScope &Constants();
     CExpressViewScope &File() { return file; }
     /// The outermost view.
     CExpressViewScope &Root() { return *file.children.front(); }
@@ -33,7 +34,6 @@ public:
 
 private:
     CStringPool pool;
-    CExpressionScope constants;
     CExpressViewScope file;
 };
 

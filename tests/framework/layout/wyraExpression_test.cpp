@@ -20,7 +20,7 @@ constexpr std::int32_t undefined = undefinedInteger;
 std::int32_t evaluated(std::string_view expression, bool logic = true)
 {
     CWyraDefinition definition;
-    definition.Constants().Define("seven", {7, {}});
+    definition.File().Define("seven", {7, {}});
     CWyraText text(expression, nullptr);
     const std::int32_t value =
         CWyraExpression(text, nullptr).Evaluate(logic ? definition.File() : definition.Constants());

@@ -26,8 +26,9 @@ private:
 
 TEST(WyraParser, PropertiesAreIntegersAndTexts)
 {
-    const Head head("code = 'Abcd'; again = code; n = 3; Box(a: 'Abcd', b: again, c: 'Abcde', d: n + n, e: '',"
-                    " f: '0.001', g: 1, g: 2, h: '$$$/K=a \n& b', i: '1e999', k: n, l: (code) + 0, m: '12', o: code) ;");
+    const Head head(
+        "code = 'Abcd'; again = code; n = 3; Box(a: 'Abcd', b: again, c: 'Abcde', d: n + n, e: '',"
+        " f: '0.001', g: 1, g: 2, h: '$$$/K=a \n& b', i: '1e999', k: n, l: (code) + 0, m: '12', o: code) ;");
     const auto properties = head();
     EXPECT_EQ(properties.Integer("a"), 0x41626364);
     EXPECT_EQ(properties.Text("a"), "Abcd");
