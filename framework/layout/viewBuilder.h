@@ -117,6 +117,8 @@ public:
 };
 
 /// The same for panes and for windows. Layouts do not tell them apart: a window is a view that others lie in.
+using CPaneBuilderBase = CViewBuilderBase;
+using CWindowBuilderBase = CViewBuilderBase;
 template <class T> using CPaneBuilder = CViewBuilder<T>;
 template <class T> using CWindowBuilder = CViewBuilder<T>;
 

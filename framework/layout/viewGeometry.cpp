@@ -65,7 +65,7 @@ void growOutset(CLayoutFrame &frame, const CLayoutFrame &child, pixels CSides::*
     frame.outset.*side = std::max(frame.outset.*side, child.outset.*side - frame.margin.*side);
 }
 
-/// A view reaches over its cell where its children reach over its margins. Behind the arrangement only the first and
+/// A view reaches over its cell where its children reach over its margins. Along the arrangement only the first and
 /// the last child lie at an edge; at the far edge across it any of them may.
 void growOutsets(CLayoutFrame &frame, const children &views)
 {

@@ -74,6 +74,8 @@ TEST(WyraExpression, Values)
         {"in(8, 40)", 0},
         {"in(-1, -1)", 0},
         {"in(3)", 0},
+        {"in(0, 0)", 1},
+        {"1 && 1 && 0", 0},
         {"max(min(1, 2), dim(max(8, 3), 2))", 6},
         // the function names are plain names elsewhere
         {"min", undefined},

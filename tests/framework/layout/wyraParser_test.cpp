@@ -139,6 +139,7 @@ TEST(WyraParser, ErrorsTellAssertionAndPlace)
         {"Box(a: 9999999999);", "Warning! (*definition == 0) line 1, column 8: a number above"},
         {"Pane() { Box();", "Warning! (*definition == 0) line 1, column 16: expected '}'"},
         {"align_centers(1, 2, &a, &b, &c); Box();", "Warning! (size() > 0) line 1, column 21: "},
+        {"align_centers(1, &a); Box();", "Warning! (*definition == 0) line 1, column 18: "},
         {"step(1, 2); Box();", "Warning! (*definition == 0) line 1, column 10: "},
         {"Box(a: f(b: 2));", "Warning! (fGenerator) line 1, column 8: "},
         {"// no comments\nBox();", "Warning! (*definition == 0) line 1, column 1: "},
