@@ -31,82 +31,34 @@ std::int32_t evaluated(std::string_view expression, bool logic = true)
 
 TEST(WyraExpression, Values)
 {
+    // clang-format off
     const struct
     {
         const char *text;
         std::int32_t value;
     } cases[] = {
-        {"10 / 3", 3},
-        {"7 % 3", 1},
-        {"-3 / 2", -1},
-        {"-7 % 3", -1},
-        {"2 + 3 * 4 - 1", 13},
-        {"20 - 5 - 5", 10},
-        {"64 / 4 / 2", 8},
-        {"\t( 2+3 )\n*\v4", 20},
-        {"- - +5", 5},
-        {"!5 + !0 * 3", 3},
-        {"!!seven", 1},
-        {"kWin_CanMove + kWin_CanSize", 6},
-        {"seven", 7},
-        {"007", 7},
+        {"10 / 3", 3}, {"7 % 3", 1}, {"-3 / 2", -1}, {"-7 % 3", -1}, {"2 + 3 * 4 - 1", 13}, {"20 - 5 - 5", 10},
+        {"64 / 4 / 2", 8}, {"\t( 2+3 )\n*\v4", 20}, {"- - +5", 5}, {"!5 + !0 * 3", 3}, {"!!seven", 1},
+        {"kWin_CanMove + kWin_CanSize", 6}, {"seven", 7}, {"007", 7},
         // comparisons and logic: 0 or 1, comparisons bind before equality, && before ||
-        {"3 <= 3", 1},
-        {"3 < 3", 0},
-        {"4 >= 5", 0},
-        {"5 > 4", 1},
-        {"2 == 1 + 1", 1},
-        {"2 != 2", 0},
-        {"1 < 2 == 1", 1},
-        {"1 || 0 && 0", 1},
-        {"9 && 4", 1},
-        {"0 || 0", 0},
-        {"2 > 1 && 0 != 1", 1},
+        {"3 <= 3", 1}, {"3 < 3", 0}, {"4 >= 5", 0}, {"5 > 4", 1}, {"2 == 1 + 1", 1}, {"2 != 2", 0},
+        {"1 < 2 == 1", 1}, {"1 || 0 && 0", 1}, {"9 && 4", 1}, {"0 || 0", 0}, {"2 > 1 && 0 != 1", 1},
         // functions
-        {"min(4, 2, 9)", 2},
-        {"max(4, seven, -9)", 7},
-        {"dim(9, 4)", 5},
-        {"dim(4, 9)", 0},
-        {"in(3, 1, 3, 5)", 1},
-        {"in(2, 1, 3, 5)", 0},
-        {"in(40, 1)", 0},
-        {"in(31, 31)", 1},
-        {"in(8, 40)", 0},
-        {"in(-1, -1)", 0},
-        {"in(3)", 0},
-        {"in(0, 0)", 1},
-        {"1 && 1 && 0", 0},
-        {"max(min(1, 2), dim(max(8, 3), 2))", 6},
+        {"min(4, 2, 9)", 2}, {"max(4, seven, -9)", 7}, {"dim(9, 4)", 5}, {"dim(4, 9)", 0}, {"in(3, 1, 3, 5)", 1},
+        {"in(2, 1, 3, 5)", 0}, {"in(40, 1)", 0}, {"in(31, 31)", 1}, {"in(8, 40)", 0}, {"in(-1, -1)", 0},
+        {"in(3)", 0}, {"in(0, 0)", 1}, {"1 && 1 && 0", 0}, {"max(min(1, 2), dim(max(8, 3), 2))", 6},
         // the function names are plain names elsewhere
-        {"min", undefined},
-        {"max + 1", undefined},
+        {"min", undefined}, {"max + 1", undefined},
         // undefined: passed on by sums and products, 0 in comparisons
-        {"u", undefined},
-        {"u + 1", undefined},
-        {"2 * u", undefined},
-        {"u - u", undefined},
-        {"-u", undefined},
-        {"u == u", 0},
-        {"u != 1", 0},
-        {"u < 1", 0},
-        {"1 >= u", 0},
-        {"!u", 0},
-        {"u || 0", 0},
-        {"u && 1", 0},
-        {"min(u, 3)", undefined},
-        {"max(3, u)", undefined},
-        {"dim(3, u)", 0},
-        {"dim(u, 3)", 0},
-        {"in(u, 1)", 0},
-        {"5 / 0", undefined},
-        {"5 % 0", undefined},
+        {"u", undefined}, {"u + 1", undefined}, {"2 * u", undefined}, {"u - u", undefined}, {"-u", undefined},
+        {"u == u", 0}, {"u != 1", 0}, {"u < 1", 0}, {"1 >= u", 0}, {"!u", 0}, {"u || 0", 0}, {"u && 1", 0},
+        {"min(u, 3)", undefined}, {"max(3, u)", undefined}, {"dim(3, u)", 0}, {"dim(u, 3)", 0}, {"in(u, 1)", 0},
+        {"5 / 0", undefined}, {"5 % 0", undefined},
         // 32 bits that wrap around
-        {"2147483647", 2147483647},
-        {"2147483647 + 2", -2147483647},
-        {"65536 * 65536", 0},
-        {"(-2147483647 - 1) / -1", undefined},
-        {"dim(2147483647, -2)", -2147483647},
+        {"2147483647", 2147483647}, {"2147483647 + 2", -2147483647}, {"65536 * 65536", 0},
+        {"(-2147483647 - 1) / -1", undefined}, {"dim(2147483647, -2)", -2147483647},
     };
+    // clang-format on
     for (const auto &c : cases)
         EXPECT_EQ(evaluated(c.text), c.value) << c.text;
 }
