@@ -122,6 +122,18 @@ const std::string &PFilter::PreferencesFolder()
     return *preferencesFolder;
 }
 
+void PFilter::MarkDirty(const PDirtyStages &stages)
+{
+    if (imageHub)
+        imageHub->InvalidateResults(stages.rough, stages.scaled, stages.final);
+}
+
+void PFilter::RefreshPreview(bool keepRough)
+{
+    if (imageHub)
+        imageHub->Refresh(keepRough);
+}
+
 bool PFilter::OutputLog() const
 {
     return params && params->outputLog;

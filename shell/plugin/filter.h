@@ -65,6 +65,10 @@ private:
     bool ReadDescriptor(PParams &record);
     void WriteDescriptor(const PParams &record);
 
+    // What the traces tell: results that are out of date.
+    void MarkDirty(const PDirtyStages &stages) override;
+    void RefreshPreview(bool keepRough) override;
+
     bool OutputLog() const override;
     PTimeLogFile *GetTimeLogFile() override;
     PHostPicture &Picture();

@@ -93,7 +93,7 @@ void PHostPicture::ReadGrey(const CRect &rect, std::uint8_t maskThreshold, const
     Sarnik::CGreySource about;
     about.kind = Format().kind;
     about.hasMask = HasSelection();
-    about.converter = converter ? &*converter : nullptr;
+    about.converter = CmykConverter();
     about.limits = Sarnik::CMaskLimits::of(maskThreshold);
     ReadRegionGrey(source.Pixmap(), rect, about, grey, mask);
 }

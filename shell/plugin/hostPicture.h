@@ -31,6 +31,7 @@ public:
     void ReadSource(Sarnik::CBasicPixmap &pixmap) override;
     void ReadSelection(Sarnik::CBasicPixmap &pixmap, int plane) override;
     void Write(Sarnik::CBasicPixmap &pixmap, const Sarnik::CRect &rect) override;
+    Sarnik::CQuadConverter *CmykConverter() override { return converter ? &*converter : nullptr; }
     Sarnik::CPageStore &PageStore() override;
     PParams &Params() override;
     PKernelCollection &Kernels() override;
