@@ -2,7 +2,7 @@
 # Not part of `all`: build the target headers_compile_alone.
 
 stillmark_glob(headers RELATIVE ${PROJECT_SOURCE_DIR}
-    platform/*.h platform/math/*.h deblur/*/*.h framework/*/*.h store/*.h shell/*.h host/*.h cli/*.h bench/*.h tests/*.h tests/*/*.h tests/*/*/*.h)
+    platform/*.h platform/*/*.h deblur/*/*.h framework/*/*.h store/*.h shell/*.h host/*.h cli/*.h bench/*.h tests/*.h tests/*/*.h tests/*/*/*.h)
 
 set(headerSources)
 foreach(header IN LISTS headers)
@@ -14,4 +14,5 @@ endforeach()
 add_library(headers_compile_alone OBJECT EXCLUDE_FROM_ALL ${headerSources})
 target_compile_options(headers_compile_alone PRIVATE -O0)
 target_link_libraries(headers_compile_alone PRIVATE stillmark_test_options
-    stillmark_host stillmark_shell stillmark_store stillmark_engine PkgConfig::VIPS PkgConfig::LCMS2 CLI11::CLI11)
+    stillmark_host stillmark_shell stillmark_store stillmark_engine PkgConfig::VIPS PkgConfig::LCMS2 CLI11::CLI11
+    stillmark_interface PkgConfig::PANGOCAIRO PkgConfig::SDL2)
