@@ -16,9 +16,9 @@ namespace Platform
 struct pen
 {
     colour ink;
-    double width = 1;           ///< view units; the line lies half on each side of its path
+    double width = 1;                ///< view units; the line lies half on each side of its path
     std::vector<double> dashes = {}; ///< lengths on and off by turns; empty: one line. Unusable ones count as empty
-    double dashOffset = 0;      ///< how far into the dashes the line begins
+    double dashOffset = 0;           ///< how far into the dashes the line begins
     bool roundEnds = false;
     bool roundJoins = false;
 };

@@ -1,6 +1,7 @@
 #include "platform/canvas/text.h"
 
 #include "platform/canvas/textLayout.h"
+#include "platform/utf8.h"
 
 #include <algorithm>
 #include <cmath>
@@ -13,29 +14,6 @@ namespace
 double units(int pango)
 {
     return static_cast<double>(pango) / PANGO_SCALE;
-}
-
-/// Length of the character at the front, 0 where it is none.
-std::size_t validLength(std::string_view s)
-{
-    const auto byte = [&](std::size_t i) { return static_cast<unsigned char>(s[i]); };
-    const unsigned lead = byte(0);
-    if (lead == 0)
-        return 0;
-    if (lead < 0x80)
-        return 1;
-    const std::size_t length = lead >= 0xF0 && lead <= 0xF4 ? 4 : lead >= 0xE0 ? 3 : lead >= 0xC2 ? 2 : 0;
-    if (length == 0 || lead > 0xF4 || s.size() < length)
-        return 0;
-    for (std::size_t i = 1; i < length; ++i)
-        if ((byte(i) & 0xC0) != 0x80)
-            return 0;
-    // Longer forms than needed, surrogates, and what lies above U+10FFFF.
-    const unsigned second = byte(1);
-    if ((lead == 0xE0 && second < 0xA0) || (lead == 0xED && second > 0x9F) || (lead == 0xF0 && second < 0x90) ||
-        (lead == 0xF4 && second > 0x8F))
-        return 0;
-    return length;
 }
 
 /// One per thread. Measures must not depend on the scale or on the user's rendering settings: no hinting.
@@ -89,22 +67,6 @@ std::size_t mostBytes(double size)
 
 } // namespace
 
-std::string cleanText(std::string_view utf8)
-{
-    std::string clean;
-    clean.reserve(utf8.size());
-    while (!utf8.empty())
-    {
-        const std::size_t length = validLength(utf8);
-        if (length == 0)
-            clean += "\xEF\xBF\xBD";
-        else
-            clean.append(utf8, 0, length);
-        utf8.remove_prefix(std::max<std::size_t>(1, length));
-    }
-    return clean;
-}
-
 textBlock::layout::layout(std::string_view utf8, const font &f, const textOptions &options)
 {
     const double size = f.size >= 1 ? std::min(f.size, 1000.0) : 1.0;
@@ -148,7 +110,7 @@ textBlock::layout::layout(std::string_view utf8, const font &f, const textOption
         line->start_index = static_cast<guint>(options.underlined);
         line->end_index = static_cast<guint>(
             static_cast<std::size_t>(options.underlined) +
-            std::max<std::size_t>(1, validLength(std::string_view(text).substr(std::size_t(options.underlined)))));
+            std::max<std::size_t>(1, characterLength(std::string_view(text).substr(std::size_t(options.underlined)))));
         pango_attr_list_insert(list, line);
         pango_layout_set_attributes(pango, list);
         pango_attr_list_unref(list);

@@ -87,7 +87,4 @@ private:
     std::unique_ptr<layout> made;
 };
 
-/// Any bytes made into UTF-8, as textBlock does.
-std::string cleanText(std::string_view utf8);
-
 } // namespace Platform

@@ -1,4 +1,5 @@
 #include "platform/canvas/canvas.h"
+#include "platform/utf8.h"
 
 #include <gmock/gmock.h>
 
@@ -107,7 +108,7 @@ TEST(text, CaretsGoThroughEveryCharacterOnce)
     EXPECT_EQ(plain.caret(999), plain.caret(13));
 }
 
-TEST(text, AnyBytesAndAnyLengthAreLaidOut)
+TEST(utf8, AnyBytesBecomeCharacters)
 {
     EXPECT_EQ(cleanText("ok \xC3\xA9"), "ok \xC3\xA9");
     EXPECT_EQ(cleanText(std::string_view("a\0b", 3)), "a\xEF\xBF\xBD"
@@ -116,6 +117,13 @@ TEST(text, AnyBytesAndAnyLengthAreLaidOut)
     EXPECT_EQ(cleanText("\xED\xA0\x80").size(), 9u) << "half a surrogate pair is no character";
     EXPECT_EQ(cleanText("\xE2\x82"), "\xEF\xBF\xBD\xEF\xBF\xBD") << "cut short";
 
+    for (const char32_t c : {U'a', U'\u00E9', U'\u20AC', U'\U0001F600', U'\U0010FFFF'})
+        EXPECT_EQ(codePoints(utf8Of(c) + "x"), (std::u32string{c, U'x'}));
+    EXPECT_EQ(codePoints(utf8Of(0xD800)), U"\uFFFD");
+}
+
+TEST(text, AnyBytesAndAnyLengthAreLaidOut)
+{
     std::mt19937 random(3);
     for (int i = 0; i < 200; ++i)
     {

@@ -1,4 +1,4 @@
-#include "platform/window/keys.h"
+#include "platform/keys.h"
 
 namespace Platform
 {
