@@ -50,6 +50,8 @@ SDL_Scancode scancodeOf(key k);
 /// From now on the end of an X11 connection sets the flag instead of ending the process. Does nothing under other
 /// window systems.
 void watchConnection(SDL_Window *window, std::atomic<bool> &lost);
+/// As it was before.
+void unwatchConnection();
 
 class sdlWindow final : public window
 {

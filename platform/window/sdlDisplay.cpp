@@ -13,6 +13,10 @@ namespace Platform
 namespace
 {
 
+/// A lost connection cannot be closed, only left, and the library holds on to it: this process has seen its last
+/// window.
+bool libraryUnusable = false;
+
 double fromEnvironment(const char *name)
 {
     const char *const text = std::getenv(name);
@@ -96,7 +100,7 @@ double wantedScale()
 
 void sdlDisplay::connection::start()
 {
-    if (isLost)
+    if (isLost || libraryUnusable)
         throw displayError("The connection to the display was lost.");
     if (isStarted)
         return;
@@ -123,8 +127,10 @@ sdlDisplay::sdlDisplay() : link(std::make_unique<connection>())
 
 sdlDisplay::~sdlDisplay()
 {
+    unwatchConnection();
+    libraryUnusable = libraryUnusable || link->isLost;
     if (!link->usable())
-        return; // a lost connection cannot be closed, only left
+        return;
     if (link->shownCursor != nullptr)
         SDL_FreeCursor(link->shownCursor);
     SDL_QuitSubSystem(SDL_INIT_VIDEO);
@@ -151,7 +157,7 @@ bool sdlDisplay::next(event &e, double wait)
     const auto tellLoss = [&] {
         if (!link->isLost || link->lossTold)
             return false;
-        link->lossTold = true;
+        link->lossTold = libraryUnusable = true;
         e = {.kind = eventKind::displayLost};
         return true;
     };

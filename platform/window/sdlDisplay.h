@@ -9,7 +9,7 @@ namespace Platform
 
 /// The user's screen. Nothing of the window system is touched before the first window is opened: until then there are
 /// no events, no modifiers, and an empty clipboard. When the last window is gone the connection stays until the display
-/// goes.
+/// goes. After the loss of a display a process can open no other one.
 ///
 /// The scale comes from the environment variable STILLMARK_SCALE (1 to 4), otherwise from GDK_SCALE, otherwise from the
 /// screen's density: 2 on screens twice as dense as usual. Where the window system scales by itself its scale counts.

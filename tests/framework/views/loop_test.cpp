@@ -272,8 +272,8 @@ TEST_F(loop, IdlersWorkBetweenEventsAndTheirErrorsAreReported)
     } some(40), others(10);
     int events = 0;
     window.filter = [&](CKeyboardMessage &) { return ++events, true; };
-    display.after(0.005).tap(key::a);
-    Run();
+    display.after(0.005).keyDown(key::a).after(0.1).keyUp(key::a);
+    Run(); // the one that failed is asked again after the next event
     EXPECT_EQ(some.left, 0);
     EXPECT_EQ(others.left, 0);
     EXPECT_EQ(events, 2);

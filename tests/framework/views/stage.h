@@ -33,7 +33,10 @@ struct notingPane : CPane
         for (const CRect &part : port.Parts())
             asked += part.Width() * part.Height();
         port.Canvas().fillRectangle(toCanvas(Bounds()), colour);
-        port.Canvas().drawLine({0, 0}, {double(Bounds().right), double(Bounds().bottom)}, {.ink = {255, 255, 255}});
+        // Nothing slanted: where such a line is clipped its edge pixels may differ by some levels.
+        const Platform::rectangle r = toCanvas(Bounds());
+        port.Canvas().drawRectangle({r.left + 3.5, r.top + 3.5, r.right - 3.5, r.bottom - 3.5},
+                                    {.ink = {255, 255, 255}});
     }
     bool MouseDown(const CMouseEvent &e) override
     {

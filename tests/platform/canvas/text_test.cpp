@@ -122,6 +122,20 @@ TEST(utf8, AnyBytesBecomeCharacters)
     EXPECT_EQ(codePoints(utf8Of(0xD800)), U"\uFFFD");
 }
 
+TEST(text, ABrokenFontSetupCostsTheLettersOnly)
+{
+    testing::FLAGS_gtest_death_test_style = "threadsafe";
+    const auto draw = [] {
+        setenv("FONTCONFIG_FILE", "/dev/null", 1);
+        setenv("FONTCONFIG_PATH", "/nonexistent", 1);
+        const textBlock text("Some letters", {}, {.width = 50, .lines = true});
+        raster picture(100, 50);
+        canvas(picture).drawText(text, {1, 1}, {255, 255, 255});
+        return text.height() >= 0 && text.offsetAt({3, 3}) <= 12 ? 0 : 1;
+    };
+    EXPECT_EXIT(std::exit(draw()), testing::ExitedWithCode(0), "");
+}
+
 TEST(text, AnyBytesAndAnyLengthAreLaidOut)
 {
     std::mt19937 random(3);
