@@ -64,7 +64,6 @@ void CWindow::Open(CWindow *by)
     owner = by;
     try
     {
-        settings.frame = placed(settings.frame, application.Display().workArea());
         Platform::windowSettings wanted{.title = localised(settings.title),
                                         .kind = settings.kind,
                                         .resizable = (settings.features & kWin_CanSize) != 0,
@@ -72,6 +71,10 @@ void CWindow::Open(CWindow *by)
                                         .place = toCanvas(settings.frame),
                                         .owner = owner == nullptr ? nullptr : owner->screen.get()};
         screen = application.Display().open(wanted);
+        // Only now is it known how large the screen is.
+        settings.frame = placed(settings.frame, application.Display().workArea());
+        if (toCanvas(settings.frame) != wanted.place)
+            screen->setPlace(toCanvas(settings.frame));
     }
     catch (const Platform::displayError &e)
     {

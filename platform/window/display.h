@@ -122,7 +122,7 @@ public:
     virtual void setClipboard(std::string_view text) = 0;
     virtual void setCursor(const cursor &c) = 0;
     virtual void beep() = 0;
-    /// The screen less the system's bars, in view units.
+    /// The screen less the system's bars, in view units; a guess before the first window is opened.
     virtual rectangle workArea() const = 0;
 };
 

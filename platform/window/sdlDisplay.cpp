@@ -194,7 +194,10 @@ bool sdlDisplay::next(event &e, double wait)
                SDL_PeepEvents(&after, 1, SDL_PEEKEVENT, SDL_FIRSTEVENT, SDL_LASTEVENT) == 1 &&
                after.type == SDL_MOUSEMOTION && after.motion.windowID == from.motion.windowID)
             SDL_PeepEvents(&from, 1, SDL_GETEVENT, SDL_MOUSEMOTION, SDL_MOUSEMOTION);
-        if (came && translate(*link, from, e))
+        const bool ours = came && translate(*link, from, e);
+        if (came && (from.type == SDL_DROPFILE || from.type == SDL_DROPTEXT))
+            SDL_free(from.drop.file);
+        if (ours)
             return true;
         if (!came && left <= 0)
             return false;

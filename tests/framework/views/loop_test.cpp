@@ -168,6 +168,22 @@ TEST_F(loop, ModalWindowsKeepInputFromOthersButNotFromTheirOwn)
     end.Stop();
 }
 
+TEST_F(loop, NegativeCornersAreSharesOfTheRoom)
+{
+    CWindow centred({"", Platform::windowKind::normal, 0, {-50, -33, 350, 167}, {}});
+    CWindow hidden({"", Platform::windowKind::plain, kWin_OpenHidden, {-32000, -32000, -31905, -31954}, {}});
+    centred.Open();
+    hidden.Open();
+    EXPECT_EQ(centred.Frame(), (CRect{760, 290, 1160, 490})) << "on a screen of 1920 by 1080";
+    EXPECT_EQ(hidden.Frame().left, -32000);
+    EXPECT_FALSE(hidden.IsVisible());
+    hidden.SetFrame({300, 300, 395, 346});
+    hidden.Show(true);
+    Run();
+    EXPECT_EQ(display.find(hidden.Screen()->id())->place().left, 300);
+    EXPECT_EQ(display.find(hidden.Screen()->id())->presentedPixels(), 95 * 46);
+}
+
 TEST_F(loop, PopupsTakeKeysAndGoWithAPressOutside)
 {
     auto *menu = new CWindow({"", Platform::windowKind::popup, kWin_AutoDelete, {50, 50, 90, 90}, {}});
