@@ -43,6 +43,8 @@ public:
     /// The window that this is in or is; null outside of any.
     virtual CWindow *Window() const { return nullptr; }
     virtual CRect Bounds() const = 0;
+    /// Null for a window.
+    virtual CView *AsView() { return nullptr; }
 
 protected:
     CContext() = default;

@@ -22,11 +22,6 @@ CView::~CView()
     DeleteChildren();
 }
 
-CView *CView::ParentView() const
-{
-    return dynamic_cast<CView *>(container);
-}
-
 bool CView::IsWithin(const CView &other) const
 {
     for (const CView *at = this; at != nullptr; at = at->ParentView())

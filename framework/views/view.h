@@ -42,7 +42,8 @@ public:
     void SetBinding(std::uint32_t bits) { bindingBits = bits; }
     CContext *Container() const { return container; }
     /// Null where the container is the window, or there is none.
-    CView *ParentView() const;
+    CView *ParentView() const { return container == nullptr ? nullptr : container->AsView(); }
+    CView *AsView() override { return this; }
     CWindow *Window() const override { return container == nullptr ? nullptr : container->Window(); }
     bool IsWithin(const CView &other) const;
     CPoint ToWindow(CPoint p) const;
