@@ -17,6 +17,9 @@ namespace
 /// window.
 bool libraryUnusable = false;
 
+/// The library's own wait does not see a connection end, only the next look at it does; seconds.
+constexpr double longestWait = 0.25;
+
 double fromEnvironment(const char *name)
 {
     const char *const text = std::getenv(name);
@@ -178,7 +181,7 @@ bool sdlDisplay::next(event &e, double wait)
     while (!link->isLost)
     {
         const double left = end - now();
-        const int milliseconds = left > 0 ? static_cast<int>(std::ceil(std::min(left, 3600.0) * 1000)) : 0;
+        const int milliseconds = left > 0 ? static_cast<int>(std::ceil(std::min(left, longestWait) * 1000)) : 0;
         SDL_Event from;
         const bool came = milliseconds > 0 ? SDL_WaitEventTimeout(&from, milliseconds) != 0 : SDL_PollEvent(&from) != 0;
         if (link->isLost)

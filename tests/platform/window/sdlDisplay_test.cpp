@@ -214,7 +214,7 @@ int showAndLose(bool painting)
     {
         if (painting)
             paintAndPresent(*w);
-        told = display.next(e, 0.1) && e.kind == eventKind::displayLost;
+        told = display.next(e, painting ? 0.1 : 1000) && e.kind == eventKind::displayLost;
     }
     if (!told || !display.lost())
         return 3;
