@@ -7,6 +7,8 @@ find_package(CLI11 REQUIRED)
 pkg_check_modules(FFTW3F REQUIRED IMPORTED_TARGET fftw3f)
 pkg_check_modules(VIPS REQUIRED IMPORTED_TARGET vips>=8.14)
 pkg_check_modules(LCMS2 REQUIRED IMPORTED_TARGET lcms2)
+pkg_check_modules(SDL2 REQUIRED IMPORTED_TARGET sdl2>=2.26)
+pkg_check_modules(PANGOCAIRO REQUIRED IMPORTED_TARGET pangocairo>=1.50 cairo)
 
 if(STILLMARK_TESTS)
     find_package(GTest REQUIRED)

@@ -14,4 +14,5 @@ endforeach()
 add_library(headers_compile_alone OBJECT EXCLUDE_FROM_ALL ${headerSources})
 target_compile_options(headers_compile_alone PRIVATE -O0)
 target_link_libraries(headers_compile_alone PRIVATE stillmark_test_options
-    stillmark_host stillmark_shell stillmark_store stillmark_engine PkgConfig::VIPS PkgConfig::LCMS2 CLI11::CLI11)
+    stillmark_host stillmark_shell stillmark_store stillmark_engine PkgConfig::VIPS PkgConfig::LCMS2 CLI11::CLI11
+    stillmark_interface PkgConfig::PANGOCAIRO PkgConfig::SDL2)

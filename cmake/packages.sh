@@ -5,9 +5,10 @@
 buildPackages=(
     g++ cmake ninja-build pkg-config
     libfftw3-dev libtbb-dev libpng-dev libvips-dev liblcms2-dev libcli11-dev
+    libsdl2-dev libcairo2-dev libpango1.0-dev
 )
 # shellcheck disable=SC2034
-testPackages=(libgtest-dev libgmock-dev libbenchmark-dev clang-format python3)
+testPackages=(libgtest-dev libgmock-dev libbenchmark-dev xvfb clang-format python3)
 
 # missingPackages PACKAGE...: prints those that are not installed, one a line.
 missingPackages()

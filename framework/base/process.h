@@ -1,6 +1,7 @@
 #pragma once
 
 #include "framework/base/alerts.h"
+#include "framework/messages/messenger.h"
 
 #include <string>
 #include <string_view>
@@ -8,22 +9,16 @@
 namespace Sarnik
 {
 
-/// The root of all that takes part in messages.
-class CMessenger
-{
-public:
-    CMessenger() = default;
-    CMessenger(const CMessenger &) = delete;
-    CMessenger &operator=(const CMessenger &) = delete;
-    virtual ~CMessenger() = default;
-};
-
 /// Something that runs until it is told to end.
 class CExecutable : public virtual CMessenger
 {
 public:
     void End() noexcept { ended = true; }
     bool Ended() const noexcept { return ended; }
+
+protected:
+    /// It runs again.
+    void Restart() noexcept { ended = false; }
 
 private:
     bool ended = false;

@@ -1,0 +1,265 @@
+#include "framework/views/window.h"
+
+#include "framework/base/exceptions.h"
+#include "framework/base/localisedString.h"
+#include "framework/views/application.h"
+#include "framework/views/dragDrop.h"
+#include "framework/views/tracker.h"
+#include "framework/views/view.h"
+
+#include <cmath>
+#include <utility>
+
+namespace Sarnik
+{
+namespace
+{
+
+/// A corner from -100 to -1 is a share of the free room in hundredths.
+CRect placed(const CRect &frame, const Platform::rectangle &area)
+{
+    const auto corner = [](std::int32_t wanted, double from, double to, std::int64_t size) {
+        if (wanted < -100 || wanted > -1)
+            return std::int64_t{wanted};
+        const double room = std::max(0.0, to - from - static_cast<double>(size));
+        return static_cast<std::int64_t>(std::lround(from + room * -wanted / 100));
+    };
+    const std::int64_t width = frame.Width(), height = frame.Height();
+    const std::int64_t left = corner(frame.left, area.left, area.right, width);
+    const std::int64_t top = corner(frame.top, area.top, area.bottom, height);
+    return {CRect::Clamped(left), CRect::Clamped(top), CRect::Clamped(left + width), CRect::Clamped(top + height)};
+}
+
+CRect rounded(const Platform::rectangle &r)
+{
+    const auto whole = [](double v) { return CRect::Clamped(std::llround(v)); };
+    const std::int32_t left = whole(r.left), top = whole(r.top);
+    return {left, top, left + whole(r.width()), top + whole(r.height())};
+}
+
+} // namespace
+
+CWindow::CWindow(CWindowSettings with) : settings(std::move(with))
+{
+}
+
+CWindow::~CWindow()
+{
+    // Whoever deletes it has it.
+    settings.features &= ~std::uint32_t{kWin_AutoDelete};
+    Close();
+    // Views still find their window as they go.
+    DeleteChildren();
+    CTracker::WindowGone(*this);
+    CApplication::Gone(*this);
+    if (drag != nullptr)
+        drag->WindowGone();
+}
+
+void CWindow::Open(CWindow *by)
+{
+    if (IsOpen())
+        return;
+    CApplication &application = *CApplication::Current();
+    owner = by;
+    try
+    {
+        Platform::windowSettings wanted{.title = localised(settings.title),
+                                        .kind = settings.kind,
+                                        .resizable = (settings.features & kWin_CanSize) != 0,
+                                        .placed = true,
+                                        .place = toCanvas(settings.frame),
+                                        .owner = owner == nullptr ? nullptr : owner->screen.get()};
+        screen = application.Display().open(wanted);
+        // Only now is it known how large the screen is.
+        settings.frame = placed(settings.frame, application.Display().workArea());
+        if (toCanvas(settings.frame) != wanted.place)
+            screen->setPlace(toCanvas(settings.frame));
+    }
+    catch (const Platform::displayError &e)
+    {
+        application.CheckDisplay();
+        throw CError(e.what());
+    }
+    application.Opened(*this);
+    Invalidate();
+    if ((settings.features & kWin_OpenHidden) == 0)
+        screen->show(true);
+}
+
+void CWindow::Close()
+{
+    if (!IsOpen())
+        return;
+    if (tracker != nullptr)
+        tracker->Abort();
+    tips.Hide();
+    hovered = pressed = nullptr;
+    pointerInside = false;
+    screen.reset();
+    End(); // a modal loop, if it is one
+    if (CApplication *const application = CApplication::Current())
+        application->Closed(*this);
+}
+
+void CWindow::Show(bool visible)
+{
+    if (!IsOpen() || screen->visible() == visible)
+        return;
+    if (visible)
+        Invalidate();
+    else
+        tips.Hide();
+    screen->show(visible);
+}
+
+void CWindow::Activate()
+{
+    if (IsOpen())
+        screen->activate();
+}
+
+bool CWindow::IsActive() const
+{
+    const CApplication *const application = CApplication::Current();
+    return application != nullptr && application->Active() == this;
+}
+
+void CWindow::SetTitle(std::string title)
+{
+    settings.title = std::move(title);
+    if (IsOpen())
+        screen->setTitle(localised(settings.title));
+}
+
+/// The user may have moved it.
+CRect CWindow::Frame() const
+{
+    return IsOpen() ? rounded(screen->place()) : settings.frame;
+}
+
+CPoint CWindow::ToScreen(CPoint p) const
+{
+    const CRect frame = Frame();
+    return {p.x + frame.left, p.y + frame.top};
+}
+
+CRect CWindow::Bounds() const
+{
+    return {0, 0, CRect::Clamped(settings.frame.Width()), CRect::Clamped(settings.frame.Height())};
+}
+
+void CWindow::SetFrame(const CRect &newFrame)
+{
+    const CRect old = Bounds();
+    settings.frame = newFrame;
+    if (IsOpen())
+        screen->setPlace(toCanvas(newFrame));
+    if (Bounds() == old)
+        return;
+    BoundsChanged(old);
+    Invalidate();
+    FrameChanged();
+}
+
+/// The display says that the size or the scale is another one.
+void CWindow::HandleResize()
+{
+    const CRect old = Bounds();
+    settings.frame = rounded(screen->place());
+    BoundsChanged(old);
+    damage.Clear();
+    Invalidate();
+    if (Bounds() != old)
+        FrameChanged();
+}
+
+CObjID CWindow::RunModal(CWindow *by)
+{
+    CApplication &application = *CApplication::Current();
+    /// However the loop ends.
+    struct modality
+    {
+        modality(CApplication &a, CWindow &w) : application(a), window(w) { application.modal.push_back(&window); }
+        ~modality()
+        {
+            std::erase(application.modal, &window);
+            window.Close();
+        }
+        CApplication &application;
+        CWindow &window;
+    };
+
+    Restart();
+    modalResult = {};
+    // The release of a button that is down will not come to where it was pressed.
+    for (CWindow *w = application.windows.Head(); w != nullptr; w = w->Next())
+        w->pressed = nullptr;
+    Open(by);
+    const modality held(application, *this);
+    while (!Ended())
+        application.ProcessOne();
+    return modalResult;
+}
+
+void CWindow::EndModal(CObjID result)
+{
+    modalResult = result;
+    End();
+}
+
+void CWindow::CloseRequested()
+{
+    if ((settings.features & kWin_CanClose) != 0)
+        Close();
+}
+
+void CWindow::SetTracking(CTracker *by)
+{
+    tracker = by;
+    trackerRan = trackerRan || by != nullptr;
+    if (IsOpen())
+        screen->capturePointer(by != nullptr);
+    tips.Hide();
+}
+
+CView *CWindow::ViewAt(CPoint p) const
+{
+    if (!toCanvas(Bounds()).contains(p))
+        return nullptr;
+    for (auto child = Children().rbegin(); child != Children().rend(); ++child)
+    {
+        const CRect &frame = (*child)->Frame();
+        if (CView *const found = (*child)->ViewAt({p.x - frame.left, p.y - frame.top}))
+            return found;
+    }
+    return nullptr;
+}
+
+void CWindow::Forget(CView &view)
+{
+    const auto drop = [&](CView *&kept) {
+        if (kept != nullptr && kept->IsWithin(view))
+            kept = nullptr;
+    };
+    if (focus != nullptr && focus->IsWithin(view))
+    {
+        focus = nullptr;
+        if (CContext *const above = view.Container())
+            above->SetTarget(nullptr);
+    }
+    for (CView **const kept : {&hovered, &pressed, &defaultView, &cancelView})
+        drop(*kept);
+    if (drag != nullptr)
+        drag->Forget(view);
+}
+
+void CWindow::ViewStateChanged(CView &view)
+{
+    if (focus != nullptr && focus->IsWithin(view) && !focus->CanFocus())
+        SetFocus(nullptr);
+    if (pressed != nullptr && pressed->IsWithin(view) && !(pressed->IsVisible() && pressed->IsEnabled()))
+        pressed = nullptr;
+}
+
+} // namespace Sarnik

@@ -1,0 +1,87 @@
+#include "platform/window/sdlConnection.h"
+
+#include <SDL_syswm.h>
+
+#include <dlfcn.h>
+
+namespace Platform
+{
+
+#if defined(SDL_VIDEO_DRIVER_X11)
+
+namespace
+{
+
+// By default the X library ends the process when its server goes, in two places: in the handler of such errors, which
+// is one for the process, and after it, in a second one of each connection. Both are replaced, the first for our
+// connection only: a host may have one of its own. The library is there already, loaded by SDL; asking for its
+// functions by name keeps it out of what the plug-in needs in order to load.
+using errorHandler = int (*)(Display *);
+using exitHandler = void (*)(Display *, void *);
+
+Display *watched = nullptr;
+std::atomic<std::atomic<bool> *> toldOfLoss = nullptr;
+errorHandler before = nullptr;
+
+template <class Function> Function libraryFunction(const char *name)
+{
+    void *const library = dlopen("libX11.so.6", RTLD_LAZY | RTLD_NOLOAD);
+    if (library == nullptr)
+        return nullptr;
+    const auto function = reinterpret_cast<Function>(dlsym(library, name));
+    dlclose(library);
+    return function;
+}
+
+int connectionFailed(Display *which)
+{
+    return which != watched && before != nullptr ? before(which) : 0;
+}
+
+void connectionEnded(Display *, void *)
+{
+    if (std::atomic<bool> *const lost = toldOfLoss)
+        *lost = true;
+}
+
+} // namespace
+
+void watchConnection(SDL_Window *window, std::atomic<bool> &lost)
+{
+    SDL_SysWMinfo info;
+    SDL_VERSION(&info.version);
+    if (watched != nullptr || SDL_GetWindowWMInfo(window, &info) != SDL_TRUE || info.subsystem != SDL_SYSWM_X11)
+        return;
+    const auto setExit = libraryFunction<void (*)(Display *, exitHandler, void *)>("XSetIOErrorExitHandler");
+    const auto setError = libraryFunction<errorHandler (*)(errorHandler)>("XSetIOErrorHandler");
+    if (setExit == nullptr || setError == nullptr)
+        return;
+    watched = info.info.x11.display;
+    toldOfLoss = &lost;
+    setExit(watched, connectionEnded, nullptr);
+    before = setError(connectionFailed);
+}
+
+void unwatchConnection()
+{
+    if (watched == nullptr)
+        return;
+    watched = nullptr;
+    toldOfLoss = nullptr;
+    const auto setError = libraryFunction<errorHandler (*)(errorHandler)>("XSetIOErrorHandler");
+    if (const errorHandler last = setError(before); last != connectionFailed)
+        setError(last); // somebody else's came after ours
+}
+
+#else
+
+void watchConnection(SDL_Window *, std::atomic<bool> &)
+{
+}
+void unwatchConnection()
+{
+}
+
+#endif
+
+} // namespace Platform
