@@ -56,6 +56,18 @@ CWindow::~CWindow()
         drag->WindowGone();
 }
 
+void CWindow::SetSettings(CWindowSettings with)
+{
+    if (IsOpen())
+        return;
+    const CRect old = Bounds();
+    settings = std::move(with);
+    if (Bounds() == old)
+        return;
+    BoundsChanged(old);
+    FrameChanged();
+}
+
 void CWindow::Open(CWindow *by)
 {
     if (IsOpen())

@@ -74,6 +74,8 @@ public:
     CWindow *Owner() const { return owner; }
     Platform::window *Screen() const { return screen.get(); }
     const CWindowSettings &Settings() const { return settings; }
+    /// For the next opening; children follow a changed size. Does nothing to an open window.
+    void SetSettings(CWindowSettings with);
 
     // The modal loop.
     /// Opens the window if it is not, and runs until EndModal, End or the closing: with what it ended, none for the
