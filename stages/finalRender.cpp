@@ -38,7 +38,7 @@ public:
           // As many again as are computed: this thread, busy with a cell of its own, leaves the others enough to do.
           line(2 * threads() + 2)
     {
-        result.CancelJob();
+        result.CancelJobs();
         final.SetBounds(hub.Host().SelectionBounds());
     }
     finalJob(const finalJob &) = delete;

@@ -150,6 +150,8 @@ std::uint64_t PImageHub::StepVisible(PPreview &preview)
         CRect{CRect::Clamped(std::int64_t{focus.left} - 1), CRect::Clamped(std::int64_t{focus.top} - 1),
               CRect::Clamped(std::int64_t{focus.right} + 1), CRect::Clamped(std::int64_t{focus.bottom} + 1)}
             .Intersected(visible);
+    if (!preview.Finished(visible))
+        preview.LookAhead(visible);
     const std::uint64_t done = focus.Empty() || first.Empty() ? 0 : preview.StepRect(first);
     return done != 0 || visible.Empty() ? done : preview.StepRect(visible);
 }
@@ -164,7 +166,10 @@ std::uint64_t PImageHub::StepLevel(PPreview &preview, const PStage *result, int 
 
 std::uint64_t PImageHub::StepStage(PStage *stage)
 {
-    return stage != nullptr ? stage->StepAll() : 0;
+    if (stage == nullptr || stage->RemainingAll() == 0)
+        return 0;
+    stage->LookAhead(stage->Rect());
+    return stage->StepAll();
 }
 
 std::uint64_t PImageHub::Step()

@@ -95,6 +95,12 @@ CRect PPreview::InResult(const CRect &area) const
     return Enlarges() ? enlarger.SourceOf(area) : InSource(area);
 }
 
+void PPreview::LookAhead(const CRect &area)
+{
+    if (ShowsResult())
+        ResultStage().LookAhead(InResult(area));
+}
+
 bool PPreview::ShowsResult() const
 {
     return hub.Host().Params().showPreview && !showOriginal;

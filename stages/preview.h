@@ -21,6 +21,7 @@ public:
     PPreview(PImageHub &owner, Level quality);
 
     void Reset() override;
+    void LookAhead(const Sarnik::CRect &area) override;
     /// viewRect: the whole picture at the view's zoom. Moved only, the pixels stay. Wires the stages that this level
     /// is made from.
     void SetTarget(const Sarnik::CRect &viewRect, const Sarnik::CRect &imageRect);

@@ -6,6 +6,7 @@
 #include "stages/source.h"
 #include "store/traces/ctrlThread.h"
 
+#include <algorithm>
 #include <atomic>
 #include <exception>
 
@@ -64,12 +65,12 @@ PResult::PResult(PImageHub &owner, Role what)
 
 PResult::~PResult()
 {
-    CancelJob();
+    CancelJobs();
 }
 
 void PResult::Reset()
 {
-    CancelJob();
+    CancelJobs();
     PStage::Reset();
 }
 
@@ -78,7 +79,7 @@ void PResult::SetBounds(const CRect &newRect)
     if (newRect == Rect() && HasPixmap())
         return;
     const PPlaneLayout layout = hub.Layout();
-    CancelJob();
+    CancelJobs();
     if (scaled != (newRect != hub.ImageBounds()))
         Reset(); // from now on out of another source
     Place(newRect, layout.depth, layout.ResultPlanes());
@@ -175,40 +176,84 @@ void PResult::RenderNow(const CRect &cell, std::int64_t column, std::int64_t row
     TakeOver(column, row, *job);
 }
 
-bool PResult::RenderBeside(const CRect &cell, std::int64_t column, std::int64_t row)
+PResult::Cells::iterator PResult::FindPending(const CRect &cell)
 {
-    if (pending && pending->cell != cell)
-        CancelJob();
-    if (pending)
-    {
-        if (!pending->finished.load(std::memory_order_acquire))
-            return false;
-        const std::shared_ptr<PPendingCell> done = std::move(pending);
-        if (done->error)
-            std::rethrow_exception(done->error);
-        TakeOver(column, row, *done->job);
-        return true;
-    }
-    // One that was dropped ends at its next plane; until then no other begins.
-    if (ending && !ending->finished.load(std::memory_order_acquire) && control->Running() > 0)
-        return false;
-    ending.reset();
+    return std::find_if(pending.begin(), pending.end(), [&](const auto &p) { return p->cell == cell; });
+}
+
+/// As many cells at a time as there are threads, and two more, so that no thread waits for the main thread to come by.
+bool PResult::RoomInLine()
+{
+    // Those that were dropped end at their next plane, or never begin.
+    std::erase_if(ending, [](const auto &p) { return p->finished.load(std::memory_order_acquire); });
+    if (control->Running() == 0)
+        ending.clear();
+    return pending.size() + ending.size() < static_cast<std::size_t>(hub.TaskPool().Threads()) + 2;
+}
+
+void PResult::Begin(const CRect &cell)
+{
     renderSettings settings;
     CollectSettings(settings);
     const auto next = std::make_shared<PPendingCell>(cell, std::move(settings), hub.Tables());
     next->job = MakeJob(cell, next->settings, next->pool);
     control->Queue([next] { next->Run(); });
-    pending = next;
+    pending.push_back(next);
     CopySource(cell); // something to look at
-    return false;
 }
 
-void PResult::CancelJob()
+bool PResult::RenderBeside(const CRect &cell, std::int64_t column, std::int64_t row)
 {
-    if (!pending)
-        return;
-    pending->pool.Stop();
-    ending = std::move(pending);
+    const auto found = FindPending(cell);
+    if (found == pending.end())
+    {
+        // A line that is full of other cells is one for another view.
+        if (!pending.empty() && !RoomInLine())
+            CancelJobs();
+        if (RoomInLine())
+            Begin(cell);
+        return false;
+    }
+    if (!(*found)->finished.load(std::memory_order_acquire))
+        return false;
+    const std::shared_ptr<PPendingCell> done = std::move(*found);
+    pending.erase(found);
+    if (done->error)
+        std::rethrow_exception(done->error);
+    TakeOver(column, row, *done->job);
+    return true;
+}
+
+/// One step for the next cell of the area ahead that nobody has begun: of its source, or its beginning. 0 where there
+/// is none, or no room for it.
+std::uint64_t PResult::WorkAhead()
+{
+    if (!RoomInLine())
+        return 0;
+    const Range cells = Touched(ahead);
+    for (std::int64_t row = cells.row; row < cells.row + cells.rows; ++row)
+        for (std::int64_t column = cells.column; column < cells.column + cells.columns; ++column)
+        {
+            const CRect cell = TileRect(column, row).Intersected(Rect());
+            if (CellRemaining(column, row) == 0 || cell.Empty() || !NeedsRender(cell) ||
+                FindPending(cell) != pending.end())
+                continue;
+            if (const std::uint64_t count = SourceStage().StepRect(SourceRect(cell)); count != 0)
+                return count;
+            Begin(cell);
+            return 1;
+        }
+    return 0;
+}
+
+void PResult::CancelJobs()
+{
+    for (std::shared_ptr<PPendingCell> &cell : pending)
+    {
+        cell->pool.Stop();
+        ending.push_back(std::move(cell));
+    }
+    pending.clear();
     control->Withdraw();
 }
 
@@ -224,7 +269,7 @@ void PResult::Invalidate(const CRect &wanted)
     if (cells.columns == 0 || cells.rows == 0)
         return;
     LowerState(wanted, 0);
-    CancelJob();
+    CancelJobs();
     // A cell is transformed as a whole: all of it may come out different.
     const CRect first = TileRect(cells.column, cells.row);
     const CRect last = TileRect(cells.column + cells.columns - 1, cells.row + cells.rows - 1);
@@ -276,6 +321,8 @@ std::uint64_t PResult::ProcessCell(std::int64_t column, std::int64_t row, bool f
     {
         if (force)
             return count;
+        if (const std::uint64_t others = WorkAhead(); others != 0)
+            return count + others;
         hub.AddAbandoned(1);
     }
     return count + 1;

@@ -3,6 +3,9 @@
 #include "stages/render/renderJob.h"
 #include "stages/stage.h"
 
+#include <memory>
+#include <vector>
+
 namespace Project
 {
 
@@ -33,11 +36,14 @@ public:
     /// dependents are told.
     void Invalidate(const Sarnik::CRect &area);
     void InvalidateAll() { Invalidate(Rect()); }
+    void LookAhead(const Sarnik::CRect &area) override { ahead = area; }
     /// Whether cells are computed beside the main thread, on the hub's task pool: so at first. A cell that is under way
-    /// stays behind, shows its source, and reports itself to the hub as abandoned. Otherwise ProcessCell computes it.
+    /// stays behind and shows its source; meanwhile others that will be asked for are begun, as many as there are
+    /// threads, and when there is no more to begin it reports itself to the hub as abandoned. Otherwise ProcessCell
+    /// computes it.
     void SetUseWorker(bool use) { useWorker = use; }
-    /// Drops the job under way; it ends soon.
-    void CancelJob();
+    /// Drops the jobs under way; they end soon.
+    void CancelJobs();
 
     bool Scaled() const { return scaled; }
     float Scale() const { return scale; }
@@ -65,6 +71,9 @@ private:
     std::int64_t Margin() const;
     void RenderNow(const Sarnik::CRect &cell, std::int64_t column, std::int64_t row);
     bool RenderBeside(const Sarnik::CRect &cell, std::int64_t column, std::int64_t row);
+    std::uint64_t WorkAhead();
+    void Begin(const Sarnik::CRect &cell);
+    bool RoomInLine();
 
     const Role role;
     bool scaled = false;
@@ -74,9 +83,12 @@ private:
     /// A cell that is computed beside the main thread, with all that it needs. The worker alone touches it until
     /// `finished`.
     struct PPendingCell;
-    std::shared_ptr<PPendingCell> pending; ///< the one that is waited for
-    std::shared_ptr<PPendingCell> ending;  ///< one that was dropped while it ran
-    std::unique_ptr<PCtrlThread> control;  ///< after the cells: its end waits for the worker
+    using Cells = std::vector<std::shared_ptr<PPendingCell>>;
+    Cells::iterator FindPending(const Sarnik::CRect &cell);
+    Cells pending; ///< under way, or done and not asked for since; the oldest first
+    Cells ending;  ///< dropped while they ran
+    Sarnik::CRect ahead;
+    std::unique_ptr<PCtrlThread> control; ///< after the cells: its end waits for the workers
 };
 
 } // namespace Project

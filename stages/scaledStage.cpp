@@ -52,6 +52,11 @@ std::uint64_t PScaledStage::ProcessCell(std::int64_t column, std::int64_t row, b
     return count + 1;
 }
 
+void PScaledStage::LookAhead(const CRect &area)
+{
+    Larger().LookAhead(scaler.SourceOf(area));
+}
+
 void PScaledStage::FillPart(const CRect &part, const CRect &area)
 {
     const int planes = Planes(), unused = UnusedPlane();

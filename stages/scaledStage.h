@@ -15,6 +15,7 @@ public:
     void SetBounds(const Sarnik::CRect &own, const Sarnik::CRect &larger);
     std::uint64_t ProcessCell(std::int64_t column, std::int64_t row, bool force) override;
     void Reset() override;
+    void LookAhead(const Sarnik::CRect &area) override;
 
     /// Pixels of the larger stage have changed: what is made from them is to be made again.
     void Notify(const Sarnik::CRect &changed);

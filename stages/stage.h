@@ -24,6 +24,10 @@ public:
     /// The cells that a rectangle touches are all finished.
     bool Finished(const Sarnik::CRect &area) const { return RemainingRegion(Touched(area)) == 0; }
 
+    /// All of this area will be asked for, from now until the next call: what is computed beside the main thread may
+    /// begin before its turn.
+    virtual void LookAhead(const Sarnik::CRect &) {}
+
 protected:
     PStage(PImageHub &owner, std::uint32_t steps) : CPixProcess(steps), hub(owner) {}
 

@@ -28,6 +28,8 @@ public:
             own.join();
     }
 
+    int Threads() const { return threads; }
+
     void Enqueue(std::function<void()> task)
     {
         {
@@ -105,6 +107,11 @@ PTaskPool::PTaskPool() : pool(std::make_unique<workers>())
 }
 
 PTaskPool::~PTaskPool() = default;
+
+int PTaskPool::Threads() const
+{
+    return pool->Threads();
+}
 
 void PTaskPool::Enqueue(std::function<void()> task)
 {

@@ -20,6 +20,8 @@ public:
     /// Waits until everything that was handed in has been worked off.
     ~PTaskPool();
 
+    /// Tasks that run at the same time, at least 1.
+    int Threads() const;
     /// Any thread. The task throws nothing.
     void Enqueue(std::function<void()> task);
 
