@@ -130,8 +130,7 @@ void CDrawTools::Icon(CPort &port, const Platform::rectangle &room, const CIcon 
     const double s = port.Scale();
     const double left = std::round(placed(room.left, room.width(), icon.Width(), x) * s) / s;
     const double top = std::round(placed(room.top, room.height(), icon.Height(), kAlign_Center) * s) / s;
-    port.Canvas().drawImage(*icon.pixels, icon.pixels->bounds(),
-                            {left, top, left + icon.Width(), top + icon.Height()},
+    port.Canvas().drawImage(*icon.pixels, icon.pixels->bounds(), {left, top, left + icon.Width(), top + icon.Height()},
                             icon.scale == s ? Platform::sampling::nearest : Platform::sampling::smooth, strength);
 }
 

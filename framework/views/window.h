@@ -95,8 +95,8 @@ public:
     /// To the next view in tab order, or the one before, around the ends. False where there is none.
     bool MoveFocus(bool forward);
     std::vector<CView *> TabOrder() const;
-    /// Whether the user finds the way by keyboard, so that the view with the focus is marked: from the tab key, an arrow
-    /// or Alt until the next press of the pointer.
+    /// Whether the user finds the way by keyboard, so that the view with the focus is marked: from the tab key, an
+    /// arrow or Alt until the next press of the pointer.
     bool ShowsFocus() const { return showsFocus; }
     /// The views that Enter and Escape press when nobody else wants these keys. Null for none.
     void SetDefaultView(CView *view) { defaultView = view; }

@@ -142,7 +142,8 @@ std::vector<CButton *> CButton::Group()
     if (Container() == nullptr)
         return {this};
     for (const auto &child : Container()->Children())
-        if (auto *const button = dynamic_cast<CButton *>(child.get()); button != nullptr && button->kind == kRadioButton)
+        if (auto *const button = dynamic_cast<CButton *>(child.get());
+            button != nullptr && button->kind == kRadioButton)
             group.push_back(button);
     return group;
 }
@@ -203,9 +204,7 @@ void CButton::Click(int)
 
 EButtonStyle CButton::OwnStyle() const
 {
-    return kind == kCheckButton   ? kButtonStyle_Check
-           : kind == kRadioButton ? kButtonStyle_Radio
-                                  : kButtonStyle_Push;
+    return kind == kCheckButton ? kButtonStyle_Check : kind == kRadioButton ? kButtonStyle_Radio : kButtonStyle_Push;
 }
 
 void CButton::Draw(CPort &port)

@@ -11,9 +11,9 @@ namespace Sarnik
 
 /// All buttons, and the class "CButton" of layouts: button_kind says what it does, button_style what it looks like.
 ///
-/// A press by the pointer, by space or by the access key ends in a click. A check button then has its new value, a radio
-/// button is on and the others of its group are off; a CValMsg<EButtonValue> of phase kValue_Click tells so. A push
-/// button sends one with kOn, and where nobody takes it the command of its id.
+/// A press by the pointer, by space or by the access key ends in a click. A check button then has its new value, a
+/// radio button is on and the others of its group are off; a CValMsg<EButtonValue> of phase kValue_Click tells so. A
+/// push button sends one with kOn, and where nobody takes it the command of its id.
 ///
 /// Leaving a button while it is pressed lets it up, coming back presses it again; Escape and a lost keyboard end the
 /// press without a click. Interface thread.

@@ -8,9 +8,9 @@ namespace Sarnik
 /// What a button does, as layouts write it.
 enum EButtonKind : std::int32_t
 {
-    kPushButton = 0,  ///< acts once when it is pressed
-    kCheckButton = 1, ///< goes on and off
-    kRadioButton = 2, ///< one of a group is on
+    kPushButton = 0,    ///< acts once when it is pressed
+    kCheckButton = 1,   ///< goes on and off
+    kRadioButton = 2,   ///< one of a group is on
     kCTAGroupButton = 3 ///< acts as a push button
 };
 

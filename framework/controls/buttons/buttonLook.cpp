@@ -59,7 +59,8 @@ CLayoutSize CButtonLook::Size(EButtonStyle style, CLayoutSize text, CLayoutSize 
     case kButtonStyle_Check:
     case kButtonStyle_Radio:
     case kButtonStyle_SmallCheck:
-    case kButtonStyle_SmallRadio: {
+    case kButtonStyle_SmallRadio:
+    {
         const std::int32_t mark = markSize(style) + ring;
         const std::int32_t beside = content.width > 0 ? content.width + static_cast<std::int32_t>(gap) : 0;
         return {mark + beside, std::max(mark, content.height + 2)};
@@ -94,8 +95,8 @@ void CButtonLook::Draw(CPort &port, const Platform::rectangle &room) const
     }
     if (style == kButtonStyle_Disclosure)
         return DrawDisclosure(port, room);
-    const Platform::rectangle face = isRound(style) ? middleSquare(shrunk(room, CDrawTools::ringRoom))
-                                                    : shrunk(room, CDrawTools::ringRoom);
+    const Platform::rectangle face =
+        isRound(style) ? middleSquare(shrunk(room, CDrawTools::ringRoom)) : shrunk(room, CDrawTools::ringRoom);
     DrawFace(port, face);
     DrawContent(port, shrunk(face, style == kButtonStyle_Push ? 4 : 0), kAlign_Center);
     if (ring)
@@ -132,9 +133,8 @@ void CButtonLook::DrawMark(CPort &port, const Platform::rectangle &box) const
     if (isRadio(style) && value == kOn)
         port.Canvas().fillEllipse(shrunk(box, box.width() / 2 - 3), ink);
     else if (value == kNeutral)
-        port.Canvas().fillRounded({box.left + 3, (box.top + box.bottom) / 2 - 1, box.right - 3,
-                                   (box.top + box.bottom) / 2 + 1},
-                                  1, ink);
+        port.Canvas().fillRounded(
+            {box.left + 3, (box.top + box.bottom) / 2 - 1, box.right - 3, (box.top + box.bottom) / 2 + 1}, 1, ink);
     else if (value == kOn)
         CDrawTools::CheckMark(port, box, ink);
     if (ring)

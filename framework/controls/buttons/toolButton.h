@@ -7,7 +7,8 @@ namespace Sarnik
 
 /// One of a set of tools: of all buttons in a window with the same tool_set one is on. Choosing one sends
 /// CValMsg<CObjID>(set, kValue_Click, id of the button). A further click on the chosen one, and each click of a double
-/// click but the first, sends a CToolClick. A press of the pointer leaves the focus where it is; arrows move the choice.
+/// click but the first, sends a CToolClick. A press of the pointer leaves the focus where it is; arrows move the
+/// choice.
 class CToolButton : public CIconButton
 {
 public:

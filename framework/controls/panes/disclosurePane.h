@@ -5,9 +5,9 @@
 namespace Sarnik
 {
 
-/// A frame whose first child, a heading, always shows, and whose other children, the content, can be hidden. Hidden, the
-/// pane is as high as the heading with the same margin above and below. Its neighbours are the parent's business: the
-/// pane says that its height has changed by a CMessageEvent of the id Changed with its own id as the source, which
+/// A frame whose first child, a heading, always shows, and whose other children, the content, can be hidden. Hidden,
+/// the pane is as high as the heading with the same margin above and below. Its neighbours are the parent's business:
+/// the pane says that its height has changed by a CMessageEvent of the id Changed with its own id as the source, which
 /// climbs from it; stackColumn (columnStack.h) is how a column answers.
 class CDisclosurePane : public CFramePane
 {

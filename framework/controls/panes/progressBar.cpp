@@ -17,7 +17,9 @@ constexpr double highest = 8, lightShare = 0.3;
 
 } // namespace
 
-CProgressBar::CProgressBar(const CRect &viewFrame) : CLayoutPane(viewFrame), timer(frameTime, Tick, this, this) {}
+CProgressBar::CProgressBar(const CRect &viewFrame) : CLayoutPane(viewFrame), timer(frameTime, Tick, this, this)
+{
+}
 
 Platform::rectangle CProgressBar::Track() const
 {
@@ -40,9 +42,9 @@ void CProgressBar::SetValue(double to)
         return;
     const double from = std::exchange(value, to);
     // The rounded end reaches some units back.
-    const auto [low, high] = std::minmax(FilledTo(from), FilledTo(to));
-    Invalidate({static_cast<std::int32_t>(std::floor(low - highest)), 0, static_cast<std::int32_t>(std::ceil(high)) + 1,
-                Bounds().bottom});
+    const double low = FilledTo(std::min(from, to)) - highest, high = FilledTo(std::max(from, to)) + 1;
+    Invalidate(
+        {static_cast<std::int32_t>(std::floor(low)), 0, static_cast<std::int32_t>(std::ceil(high)), Bounds().bottom});
     Update();
 }
 

@@ -68,11 +68,9 @@ void CStaticText::Draw(CPort &port)
         return CDrawTools::Text(port, room, Label(), DrawnFont(), Ink(), alignX, alignY, trim);
     if (room.empty() || Label().text.empty())
         return;
-    const Platform::textBlock block(Label().text, DrawnFont(),
-                                    {.width = room.width(),
-                                     .lines = true,
-                                     .align = lineAlign(alignX),
-                                     .underlined = Label().underlined});
+    const Platform::textBlock block(
+        Label().text, DrawnFont(),
+        {.width = room.width(), .lines = true, .align = lineAlign(alignX), .underlined = Label().underlined});
     // A text that is too high shows its beginning.
     const EAlign y = block.height() > room.height() ? kAlign_Near : alignY;
     CDrawTools::Text(port, room, block, Ink(), kAlign_Near, y);

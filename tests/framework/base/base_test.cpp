@@ -22,10 +22,10 @@ TEST(LocalisedString, ShowsTheDefaultAndFillsPlaces)
 
 TEST(LocalisedString, SequencesStandForCharacters)
 {
-    EXPECT_EQ(localised("$$$/K=^[a^]^{b^}^N^n^t^^0^Q^V^P^p^o"),
-              "\u201Ca\u201D\u2018b\u2019\r\n\n\t^0?|Altaltcontrol");
+    EXPECT_EQ(localised("$$$/K=^[a^]^{b^}^N^n^t^^0^Q^V^P^p^o"), "\u201Ca\u201D\u2018b\u2019\r\n\n\t^0?|Altaltcontrol");
     EXPECT_EQ(localised("$$$/K=^+20AC^+20ac^+d83D^+De00"), "\u20AC\u20AC\U0001F600");
-    EXPECT_EQ(localised("$$$/K=^+D83D ^+DE00 ^+20A ^z ^Z^"), "\uFFFD \uFFFD ^+20A ^z ^Z^") << "halves, and what is none";
+    EXPECT_EQ(localised("$$$/K=^+D83D ^+DE00 ^+20A ^z ^Z^"), "\uFFFD \uFFFD ^+20A ^z ^Z^")
+        << "halves, and what is none";
     EXPECT_EQ(localised("$$$Loose=^C"), "\u00A9");
     EXPECT_EQ(localised("^C"), "^C") << "no key";
     EXPECT_EQ(localised("$$$/K=^^0 ^0", {"^n"}), "^0 ^n");

@@ -157,7 +157,7 @@ TEST_F(buttons, ToolsOfASetAreOneChoice)
     EXPECT_TRUE(field.HasFocus());
     EXPECT_FALSE(tools[0]->IsOn());
     display.tap(key::tab).tap(key::down);
-    EXPECT_THAT(Told(), ElementsAre("field blur", "set 2 tool2"));
+    EXPECT_THAT(Told(), ElementsAre("field key \t", "field blur", "set 2 tool2"));
     EXPECT_EQ(window.TabOrder(), (std::vector<CView *>{tools[2], &field}));
     CToolButton::Choose(window, "set", {});
     EXPECT_TRUE(std::none_of(tools.begin(), tools.end(), [](const auto *t) { return t->IsOn(); }));
@@ -180,7 +180,8 @@ TEST(buttonLayouts, ADialogNeedsNoCodeForItsOwnButtons)
         EXPECT_EQ(dialog.Find<CIconButton>("arrow")->Bounds(), (CRect{0, 0, 16, 16}));
         EXPECT_EQ(dialog.FindView("cancel")->Bounds().right, 90);
         EXPECT_GE(dialog.FindView("check")->Bounds().bottom, 18);
-        display.tap(pressed);
+        dialog.Open();
+        display.to(*dialog.Screen()).tap(pressed);
         return dialog.RunModal();
     };
     EXPECT_EQ(answer(key::enter), CObjID("ok"));

@@ -51,8 +51,7 @@ struct controlStage : stage
     {
         struct once : CTimer
         {
-            once(double when, std::function<void()> what)
-                : CTimer(when, &once::Fire, this), call(std::move(what))
+            once(double when, std::function<void()> what) : CTimer(when, &once::Fire, this), call(std::move(what))
             {
                 Start();
             }
