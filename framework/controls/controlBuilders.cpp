@@ -1,7 +1,17 @@
 #include "framework/controls/controlBuilders.h"
 
+#include "framework/controls/buttons/checkButton.h"
+#include "framework/controls/buttons/iconButton.h"
+#include "framework/controls/buttons/pushButton.h"
+#include "framework/controls/buttons/toolButton.h"
 #include "framework/controls/dialog.h"
 #include "framework/controls/layoutPane.h"
+#include "framework/controls/panes/framePane.h"
+#include "framework/controls/panes/groupPane.h"
+#include "framework/controls/panes/progressBar.h"
+#include "framework/controls/panes/staticImage.h"
+#include "framework/controls/panes/staticText.h"
+#include "framework/controls/panes/switchPane.h"
 
 namespace Sarnik
 {
@@ -9,6 +19,19 @@ namespace Sarnik
 void enterControlBuilders()
 {
     static const CPaneBuilder<CLayoutPane> pane("CPane");
+    static const CPaneBuilder<CButton> button("CButton");
+    static const CPaneBuilder<CPushButton> pushButton("CPushButton");
+    static const CPaneBuilder<CCheckButton> checkButton("CCheckButton");
+    static const CPaneBuilder<CRadioButton> radioButton("CRadioButton");
+    static const CPaneBuilder<CIconButton> iconButton("CIconButton");
+    static const CPaneBuilder<CToolButton> toolButton("CToolButton");
+    static const CPaneBuilder<CStaticText> staticText("CStaticText");
+    static const CPaneBuilder<CStaticImage> staticImage("CStaticImage");
+    static const CPaneBuilder<CFramePane> framePane("CFramePane");
+    static const CPaneBuilder<CGroupPane> groupPane("CGroupPane");
+    static const CPaneBuilder<CSwitchPane> switchPane("CSwitchPane");
+    static const CPaneBuilder<CCasePane> casePane("CCasePane");
+    static const CPaneBuilder<CProgressBar> progressBar("CProgressBar");
     static const CWindowBuilder<CDialog> dialog("CDialog"), window("CWindow");
 }
 
