@@ -123,12 +123,12 @@ void CDrawTools::Face(CPort &port, const Platform::rectangle &r, EFace state, bo
     port.Canvas().fillRounded(shrunk(place, line), corner - line, fill);
 }
 
-void CDrawTools::Field(CPort &port, const Platform::rectangle &r, bool enabled)
+void CDrawTools::Field(CPort &port, const Platform::rectangle &r, bool enabled, bool hot)
 {
     const CPalette &c = Colours();
     const Platform::rectangle place = snapped(port, r);
     const double line = 1 / port.Scale();
-    port.Canvas().fillRounded(place, corner, enabled ? c.edge : c.groove);
+    port.Canvas().fillRounded(place, corner, hot ? c.edgeLight : enabled ? c.edge : c.groove);
     port.Canvas().fillRounded(shrunk(place, line), corner - line, enabled ? c.field : Platform::colour{78, 78, 78});
 }
 

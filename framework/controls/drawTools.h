@@ -80,7 +80,7 @@ public:
     /// A raised surface with rounded corners; `prominent` in the accent colour.
     static void Face(CPort &port, const Platform::rectangle &r, EFace state, bool prominent = false);
     /// A sunken surface for text and lists.
-    static void Field(CPort &port, const Platform::rectangle &r, bool enabled);
+    static void Field(CPort &port, const Platform::rectangle &r, bool enabled, bool hot = false);
     /// Around r, outside of it, within ringRoom.
     static void FocusRing(CPort &port, const Platform::rectangle &r, double radius = corner);
     /// A line, one pixel wide at every scale.

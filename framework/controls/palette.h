@@ -20,9 +20,10 @@ struct CPalette
     Platform::colour edge{48, 48, 48}; ///< around fields and buttons
     Platform::colour edgeLight{116, 116, 116};
     Platform::colour groove{64, 64, 64};
-    Platform::colour accent{38, 104, 186};     ///< chosen, selected, filled
-    Platform::colour ring{110, 172, 255};      ///< around what has the focus
-    Platform::colour accentDim{104, 104, 112}; ///< selected in what has no focus
+    Platform::colour accent{38, 104, 186};      ///< chosen, selected, filled
+    Platform::colour accentLight{88, 152, 232}; ///< filled parts of thin lines
+    Platform::colour ring{110, 172, 255};       ///< around what has the focus
+    Platform::colour accentDim{104, 104, 112};  ///< selected in what has no focus
     Platform::colour tip{250, 247, 214};
     Platform::colour tipText{24, 24, 24};
 };
