@@ -3,6 +3,7 @@
 #include "framework/controls/drawTools.h"
 #include "framework/controls/layoutPane.h"
 #include "framework/messages/messages.h"
+#include "framework/views/window.h"
 
 #include <cstdint>
 #include <memory>
@@ -48,6 +49,8 @@ protected:
     static std::int32_t ReadFont(const CWyraVariablePropertyList &properties, std::string_view ownProperty);
 
     bool IsHot() const { return hot; }
+    /// Whether the focus ring is to be drawn: it has the focus, and the user finds the way by keyboard.
+    bool ShowsRing() const { return HasFocus() && Window()->ShowsFocus(); }
     void SetHot(bool isHot);
     Platform::colour Ink() const { return IsEnabled() ? CDrawTools::Colours().text : CDrawTools::Colours().textDim; }
     /// The room of the view in its own coordinates.

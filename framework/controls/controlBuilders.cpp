@@ -1,8 +1,18 @@
 #include "framework/controls/controlBuilders.h"
 
+#include "framework/controls/buttons/checkButton.h"
+#include "framework/controls/buttons/iconButton.h"
+#include "framework/controls/buttons/pushButton.h"
+#include "framework/controls/buttons/toolButton.h"
 #include "framework/controls/dialog.h"
 #include "framework/controls/fields/editNumber.h"
 #include "framework/controls/layoutPane.h"
+#include "framework/controls/panes/framePane.h"
+#include "framework/controls/panes/groupPane.h"
+#include "framework/controls/panes/progressBar.h"
+#include "framework/controls/panes/staticImage.h"
+#include "framework/controls/panes/staticText.h"
+#include "framework/controls/panes/switchPane.h"
 #include "framework/controls/sliders/angleSlider.h"
 #include "framework/controls/sliders/editSlider.h"
 
@@ -17,6 +27,19 @@ void enterControlBuilders()
     static const CPaneBuilder<CCustomSlider> customSlider("CCustomSlider");
     static const CPaneBuilder<CEditSlider> editSlider("CEditSlider");
     static const CPaneBuilder<CAngleSlider> angleSlider("CAngleSlider");
+    static const CPaneBuilder<CButton> button("CButton");
+    static const CPaneBuilder<CPushButton> pushButton("CPushButton");
+    static const CPaneBuilder<CCheckButton> checkButton("CCheckButton");
+    static const CPaneBuilder<CRadioButton> radioButton("CRadioButton");
+    static const CPaneBuilder<CIconButton> iconButton("CIconButton");
+    static const CPaneBuilder<CToolButton> toolButton("CToolButton");
+    static const CPaneBuilder<CStaticText> staticText("CStaticText");
+    static const CPaneBuilder<CStaticImage> staticImage("CStaticImage");
+    static const CPaneBuilder<CFramePane> framePane("CFramePane");
+    static const CPaneBuilder<CGroupPane> groupPane("CGroupPane");
+    static const CPaneBuilder<CSwitchPane> switchPane("CSwitchPane");
+    static const CPaneBuilder<CCasePane> casePane("CCasePane");
+    static const CPaneBuilder<CProgressBar> progressBar("CProgressBar");
     static const CWindowBuilder<CDialog> dialog("CDialog"), window("CWindow");
 }
 

@@ -11,6 +11,20 @@
 
 namespace Sarnik
 {
+namespace
+{
+
+void tellDone(const CContext &context)
+{
+    for (const auto &child : context.Children())
+    {
+        tellDone(*child);
+        if (auto *const pane = dynamic_cast<CLayoutPane *>(child.get()))
+            pane->LayoutDone();
+    }
+}
+
+} // namespace
 
 void CDialog::Load(std::string_view resourceName)
 {
@@ -26,6 +40,7 @@ void CDialog::LoadText(std::string_view layout)
     CWyraGenerator generator(measure);
     generator.Parse(layout);
     generator.GenerateViews(*this);
+    tellDone(*this);
     Loaded();
 }
 

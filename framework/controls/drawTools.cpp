@@ -109,18 +109,29 @@ void CDrawTools::Text(CPort &port, const Platform::rectangle &room, std::string_
     Text(port, room, label{std::string(text)}, font, ink, x, y, trim);
 }
 
-void CDrawTools::Face(CPort &port, const Platform::rectangle &r, EFace state, bool prominent)
+void CDrawTools::Face(CPort &port, const Platform::rectangle &r, EFace state, bool prominent, double radius)
 {
     const CPalette &c = Colours();
     const Platform::rectangle place = snapped(port, r);
     Platform::colour fill = state == EFace::pressed ? c.facePressed : state == EFace::hot ? c.faceHot : c.face;
     if (prominent && state != EFace::disabled)
-        fill = state == EFace::pressed ? Platform::colour{28, 82, 150} : c.accent;
+        fill = state == EFace::pressed ? c.accentPressed : state == EFace::hot ? c.accentHot : c.accent;
     const double line = 1 / port.Scale();
     if (state == EFace::disabled)
         fill = {88, 88, 88};
-    port.Canvas().fillRounded(place, corner, state == EFace::disabled ? c.groove : c.edge);
-    port.Canvas().fillRounded(shrunk(place, line), corner - line, fill);
+    port.Canvas().fillRounded(place, radius, state == EFace::disabled ? c.groove : c.edge);
+    port.Canvas().fillRounded(shrunk(place, line), radius - line, fill);
+}
+
+void CDrawTools::Icon(CPort &port, const Platform::rectangle &room, const CIcon &icon, EAlign x, double strength)
+{
+    if (!icon)
+        return;
+    const double s = port.Scale();
+    const double left = std::round(placed(room.left, room.width(), icon.Width(), x) * s) / s;
+    const double top = std::round(placed(room.top, room.height(), icon.Height(), kAlign_Center) * s) / s;
+    port.Canvas().drawImage(*icon.pixels, icon.pixels->bounds(), {left, top, left + icon.Width(), top + icon.Height()},
+                            icon.scale == s ? Platform::sampling::nearest : Platform::sampling::smooth, strength);
 }
 
 void CDrawTools::Field(CPort &port, const Platform::rectangle &r, bool enabled, bool hot)

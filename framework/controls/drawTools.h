@@ -1,5 +1,6 @@
 #pragma once
 
+#include "framework/controls/iconSource.h"
 #include "framework/controls/palette.h"
 #include "framework/layout/viewBuilder.h"
 #include "framework/pixels/rect.h"
@@ -78,7 +79,11 @@ public:
                      Platform::colour ink, EAlign x, EAlign y);
 
     /// A raised surface with rounded corners; `prominent` in the accent colour.
-    static void Face(CPort &port, const Platform::rectangle &r, EFace state, bool prominent = false);
+    static void Face(CPort &port, const Platform::rectangle &r, EFace state, bool prominent = false,
+                     double radius = corner);
+    /// A picture in a room, in the middle of its height, on whole pixels; `strength` from 0 to 1.
+    static void Icon(CPort &port, const Platform::rectangle &room, const CIcon &icon, EAlign x = kAlign_Center,
+                     double strength = 1);
     /// A sunken surface for text and lists.
     static void Field(CPort &port, const Platform::rectangle &r, bool enabled, bool hot = false);
     /// Around r, outside of it, within ringRoom.

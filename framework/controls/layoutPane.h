@@ -33,6 +33,8 @@ public:
     void TakeLayout(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) final;
     /// Puts the child in front of the others. Throws CLayoutError for one that is no view.
     void AdoptChild(std::unique_ptr<CLayoutView> child, std::int32_t interior) override;
+    /// All views of the layout stand in their window.
+    virtual void LayoutDone() {}
 
 protected:
     virtual void ReadProperties(const CLayoutPlacement &, const CWyraVariablePropertyList &) {}

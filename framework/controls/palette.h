@@ -6,10 +6,12 @@ namespace Sarnik
 {
 
 /// The colours of the interface: grey without a tint, so that they leave the eye's judgement of a photograph alone, and
-/// one accent. Text on `window`, `face`, `faceHot`, `field`, `menu` and `accent` has a contrast of at least 4.5:1.
+/// one accent. Text on `window`, `panel`, `face`, `faceHot`, `field`, `menu` and the accents has a contrast of at
+/// least 4.5:1.
 struct CPalette
 {
     Platform::colour window{83, 83, 83};
+    Platform::colour panel{79, 79, 79}; ///< of what belongs together, on the window
     Platform::colour text{238, 238, 238};
     Platform::colour textDim{152, 152, 152}; ///< of what is disabled
     Platform::colour field{56, 56, 56};      ///< behind typed text, lists and progress
@@ -20,7 +22,9 @@ struct CPalette
     Platform::colour edge{48, 48, 48}; ///< around fields and buttons
     Platform::colour edgeLight{116, 116, 116};
     Platform::colour groove{64, 64, 64};
-    Platform::colour accent{38, 104, 186};      ///< chosen, selected, filled
+    Platform::colour accent{34, 97, 175}; ///< chosen, selected, filled
+    Platform::colour accentHot{42, 107, 189};
+    Platform::colour accentPressed{26, 78, 145};
     Platform::colour accentLight{88, 152, 232}; ///< filled parts of thin lines
     Platform::colour ring{110, 172, 255};       ///< around what has the focus
     Platform::colour accentDim{104, 104, 112};  ///< selected in what has no focus

@@ -67,6 +67,8 @@ public:
 
     // Focus.
     virtual bool CanFocus() const;
+    /// Whether the tab key stops at it, where it can have the focus. Of a group the chosen one does.
+    virtual bool IsTabStop() const { return HasOption(kView_TabStop); }
     bool HasFocus() const;
     /// False where it cannot have it.
     bool SetFocus();
@@ -105,6 +107,8 @@ public:
     // Told after the fact.
     virtual void FrameChanged() {}
     virtual void FocusChanged(bool) {}
+    /// The focus has come to one of its descendants, or left it.
+    virtual void FocusWithinChanged() {}
     /// The view or an ancestor was shown, hidden, enabled or disabled.
     virtual void StateChanged() {}
 

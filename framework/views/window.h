@@ -95,6 +95,9 @@ public:
     /// To the next view in tab order, or the one before, around the ends. False where there is none.
     bool MoveFocus(bool forward);
     std::vector<CView *> TabOrder() const;
+    /// Whether the user finds the way by keyboard, so that the view with the focus is marked: from the tab key, an
+    /// arrow or Alt until the next press of the pointer.
+    bool ShowsFocus() const { return showsFocus; }
     /// The views that Enter and Escape press when nobody else wants these keys. Null for none.
     void SetDefaultView(CView *view) { defaultView = view; }
     void SetCancelView(CView *view) { cancelView = view; }
@@ -157,6 +160,7 @@ private:
     void Hover(CView *view, const CMouseEvent &e);
     void UpdateCursor();
     bool PressAccessKey(char32_t character);
+    void SetShowsFocus(bool shows);
     CMessenger &Leaf();
     void DrawChildren(const CContext &of, Platform::canvas &canvas, std::span<const CRect> parts, const CRect &clip,
                       CPoint origin);
@@ -175,6 +179,7 @@ private:
     double damagedSince = 0;
     CPoint pointer;
     bool pointerInside = false;
+    bool showsFocus = false;
     bool trackerRan = false; ///< within the press that is being handled
     std::uint32_t pointerModifiers = 0;
     Platform::cursor cursor;

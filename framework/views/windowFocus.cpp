@@ -37,6 +37,9 @@ bool CWindow::SetFocus(CView *view)
     SetTarget(nullptr);
     for (CView *at = view; at != nullptr; at = at->ParentView())
         at->Container()->SetTarget(at);
+    for (CView *const end : {old, view})
+        for (CView *at = end; at != nullptr && at->ParentView() != nullptr; at = at->ParentView())
+            at->ParentView()->FocusWithinChanged();
     if (old != nullptr)
         old->FocusChanged(false);
     // Whoever lost it may have given it to a third one.
@@ -45,13 +48,19 @@ bool CWindow::SetFocus(CView *view)
     return true;
 }
 
+void CWindow::SetShowsFocus(bool shows)
+{
+    if (std::exchange(showsFocus, shows) != shows && focus != nullptr)
+        focus->Invalidate();
+}
+
 std::vector<CView *> CWindow::TabOrder() const
 {
     std::vector<CView *> order;
     forEachView(*this, [&](CView &view) {
         if (view.HasOption(kView_Invisible) || view.HasOption(kView_Disabled) || view.HasOption(kView_NoTabNavigate))
             return false;
-        if (view.HasOption(kView_TabStop) && view.CanFocus())
+        if (view.IsTabStop() && view.CanFocus())
             order.push_back(&view);
         return true;
     });
@@ -72,8 +81,12 @@ bool CWindow::MoveFocus(bool forward)
 
 bool CWindow::HandleKeyboard(CKeyboardMessage &message)
 {
+    using Platform::key;
     const CApplication::witness alive(*this);
     tips.Hide();
+    const bool navigates = message.Key() == key::tab || (message.Key() >= key::left && message.Key() <= key::pageDown);
+    if (message.IsDown() && (navigates || (message.Modifiers() & Platform::altModifier) != 0))
+        SetShowsFocus(true);
     if (KeyboardFilter(message) || !alive)
         return true;
     if (Leaf().Dispatch(message) || !alive)
@@ -81,7 +94,6 @@ bool CWindow::HandleKeyboard(CKeyboardMessage &message)
     if (!message.IsDown())
         return false;
 
-    using Platform::key;
     if (const auto shortcut = shortcuts.find(message.Shortcut()); shortcut != shortcuts.end())
     {
         // A command that cannot be carried out still owns its keys.

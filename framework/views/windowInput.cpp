@@ -91,6 +91,7 @@ void CWindow::HandlePointer(const Platform::event &e)
 void CWindow::HandleDown(CMouseEvent &e)
 {
     tips.Hide();
+    SetShowsFocus(false);
     CView *const front = ViewAt(e.inWindow);
     // A disabled view keeps the press from what lies below it.
     if (front == nullptr || !front->IsEnabled() || e.button == 2)

@@ -154,9 +154,9 @@ void CAngleSlider::Draw(CPort &port)
     const auto disc = [&](double r, Platform::colour ink) {
         canvas.fillEllipse({middle.x - r, middle.y - r, middle.x + r, middle.y + r}, ink);
     };
-    if (HasFocus())
+    if (ShowsRing())
         disc(radius + 1.75, colours.ring);
-    disc(radius, enabled && IsHot() && !HasFocus() ? colours.edgeLight : enabled ? colours.edge : colours.groove);
+    disc(radius, enabled && IsHot() && !ShowsRing() ? colours.edgeLight : enabled ? colours.edge : colours.groove);
     disc(radius - 1, enabled ? colours.field : Platform::colour{78, 78, 78});
 
     const auto at = [&](double angle, double distance) {

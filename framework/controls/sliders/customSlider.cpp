@@ -179,7 +179,7 @@ void CCustomSlider::Draw(CPort &port)
         canvas.fillEllipse({centre.x - radius, centre.y - radius, centre.x + radius, centre.y + radius}, ink);
     };
     constexpr double radius = knobSize / 2.0;
-    if (HasFocus())
+    if (ShowsRing())
         disc(radius + 1.5, colours.ring);
     disc(radius, colours.edge);
     disc(radius - 1, !enabled      ? colours.edgeLight

@@ -1,74 +1,80 @@
 #pragma once
 
+#include "framework/controls/buttons/button.h"
 #include "tests/framework/views/stage.h"
-
-#include <sstream>
 
 namespace Sarnik::Test
 {
 
-/// An open window that writes down the values that its controls tell: "EditBegin 3".
+/// A stage whose controls lie in a pane that writes down what they say: "name phase value", "command name", "event
+/// source".
 struct controlStage : stage
 {
-    explicit controlStage(double scale = 1) : stage(scale) { display.to(*panel.Screen()); }
+    explicit controlStage(double scale = 1) : stage(scale), pane(window.Make<notingHost>(log)) {}
 
-    struct notingPanel : CWindow
+    struct notingHost : CPane
     {
-        explicit notingPanel(Log &told)
-            : CWindow({"Panel", Platform::windowKind::normal, 63, {0, 0, 300, 200}, {83, 83, 83}}), entries(told)
-        {
-            Open();
-        }
+        explicit notingHost(Log &log) : CPane({0, 0, 200, 120}), entries(log) {}
+
         bool ReceiveValue(CValueMessage &m) override
         {
-            static constexpr const char *names[] = {"",        "Set",       "Click", "DragBegin", "Drag",
-                                                    "DragEnd", "EditBegin", "Edit",  "EditEnd"};
-            std::ostringstream line;
-            line << names[m.Phase()] << " ";
-            if (const auto *const number = dynamic_cast<CValMsg<CNumber> *>(&m))
-                line << number->Value().value;
-            else if (const auto *const text = dynamic_cast<CValMsg<std::string> *>(&m))
-                line << text->Value();
-            entries.push_back(line.str());
-            last = m.Id();
+            std::string value;
+            if (const auto *const button = dynamic_cast<const CValMsg<EButtonValue> *>(&m))
+                value = std::to_string(button->Value());
+            else if (const auto *const id = dynamic_cast<const CValMsg<CObjID> *>(&m))
+                value = id->Value().Name();
+            entries.push_back(m.Id().Name() + " " + std::to_string(m.Phase()) + " " + value);
             if (onValue)
-                onValue(m);
-            return true;
+                onValue();
+            return takesValues;
         }
-        bool ReceiveCommand(CCommandMessage &m) override
+        bool ReceiveMessage(CMessage &m) override
         {
-            entries.push_back("command " + m.Id().Name());
+            if (const auto *const event = dynamic_cast<const CMessageEvent *>(&m))
+                entries.push_back(m.Id().Name() + " " + event->Source().Name());
             return true;
         }
-        bool UpdateCommand(CCommandMessage &m) override { return m.enabled = true; }
-        void CloseRequested() override {}
 
         Log &entries;
-        CObjID last;
-        std::function<void(CValueMessage &)> onValue;
+        std::function<void()> onValue;
+        bool takesValues = true;
     };
 
-    /// Presented pixels while something is done, in view units squared.
-    template <class Action> std::int64_t Painted(Action action)
+    template <class T> T &Control(const char *name, const CRect &frame, CContext *in = nullptr)
     {
-        Run();
-        const std::int64_t before = Shown().presentedPixels();
-        action();
-        Run();
-        return (Shown().presentedPixels() - before) / static_cast<std::int64_t>(display.pixelsPerUnit());
+        T &control = (in == nullptr ? static_cast<CContext &>(pane) : *in).Make<T>(frame);
+        control.SetId(CObjID(name));
+        return control;
     }
-    Platform::memoryWindow &Shown() { return *display.find(panel.Screen()->id()); }
-    /// What is shown is what a paint of everything would show.
-    void ExpectFreshScreen()
+    /// Calls an action in the middle of a script, where a tracker may run.
+    void At(double seconds, std::function<void()> action)
+    {
+        struct once : CTimer
+        {
+            once(double when, std::function<void()> what) : CTimer(when, &once::Fire, this), call(std::move(what))
+            {
+                Start();
+            }
+            static void Fire(void *self)
+            {
+                static_cast<once *>(self)->Stop();
+                static_cast<once *>(self)->call();
+            }
+            std::function<void()> call;
+        };
+        calls.push_back(std::make_unique<once>(seconds, std::move(action)));
+    }
+    std::int64_t PixelsShown(const std::function<void()> &change)
     {
         Run();
-        const Platform::raster kept = Shown().screen();
-        panel.Invalidate();
-        application.ProcessAll();
-        EXPECT_TRUE(kept == Shown().screen());
+        const std::int64_t before = Screen().presentedPixels();
+        change();
+        Run();
+        return Screen().presentedPixels() - before;
     }
 
-    notingPanel panel{log};
+    notingHost &pane;
+    std::vector<std::unique_ptr<CTimer>> calls;
 };
 
 } // namespace Sarnik::Test

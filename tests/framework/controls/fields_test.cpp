@@ -1,6 +1,6 @@
 #include "framework/base/alerts.h"
 #include "framework/controls/fields/editNumber.h"
-#include "tests/framework/controls/controlStage.h"
+#include "tests/framework/controls/valueStage.h"
 
 #include <random>
 
@@ -15,7 +15,7 @@ using testing::IsEmpty;
 namespace
 {
 
-struct fields : controlStage
+struct fields : valueStage
 {
     CEditString &Field(const char *text, std::uint32_t options = 0, CRect frame = {10, 10, 160, 32})
     {

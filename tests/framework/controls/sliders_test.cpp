@@ -1,7 +1,7 @@
 #include "framework/controls/dialog.h"
 #include "framework/controls/sliders/angleSlider.h"
 #include "framework/controls/sliders/editSlider.h"
-#include "tests/framework/controls/controlStage.h"
+#include "tests/framework/controls/valueStage.h"
 
 #include <cmath>
 #include <numbers>
@@ -16,9 +16,9 @@ using testing::IsEmpty;
 namespace
 {
 
-struct sliders : controlStage
+struct sliders : valueStage
 {
-    using controlStage::controlStage;
+    using valueStage::valueStage;
 
     /// From 0 to 100 over 200 units: x = 20 + 2 * value.
     CCustomSlider &Slider()
@@ -176,7 +176,7 @@ TEST_F(sliders, ASliderAndItsFieldAreOneControl)
     EXPECT_FALSE(both.Field().CanFocus());
 }
 
-struct dial : controlStage
+struct dial : valueStage
 {
     dial() : angle(panel.Make<CAngleSlider>(CRect{50, 50, 150, 150})) {}
     /// A place in a direction from the dial's middle.
