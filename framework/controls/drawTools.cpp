@@ -126,12 +126,12 @@ void CDrawTools::Icon(CPort &port, const Platform::rectangle &room, const CIcon 
                             strength);
 }
 
-void CDrawTools::Field(CPort &port, const Platform::rectangle &r, bool enabled)
+void CDrawTools::Field(CPort &port, const Platform::rectangle &r, bool enabled, bool hot)
 {
     const CPalette &c = Colours();
     const Platform::rectangle place = port.Canvas().sharp(r);
     const double line = 1 / port.Scale();
-    port.Canvas().fillRounded(place, corner, enabled ? c.edge : c.groove);
+    port.Canvas().fillRounded(place, corner, hot ? c.edgeLight : enabled ? c.edge : c.groove);
     port.Canvas().fillRounded(shrunk(place, line), corner - line, enabled ? c.field : Platform::colour{78, 78, 78});
 }
 
