@@ -6,6 +6,7 @@
 #include "framework/views/window.h"
 
 #include <cstdint>
+#include <memory>
 #include <string>
 #include <utility>
 
@@ -37,6 +38,9 @@ public:
     void FocusChanged(bool) override { Invalidate(); }
     void StateChanged() override { Invalidate(); }
 
+    /// Expires with the control: whoever goes on after a message of it looks here first.
+    std::weak_ptr<const void> Life() const { return life; }
+
 protected:
     /// text and the font that `fontProperty` names, or control_font, or text_font.
     void ReadProperties(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) override;
@@ -62,6 +66,7 @@ protected:
     bool SendCommand(CObjID command);
 
 private:
+    std::shared_ptr<const void> life = std::make_shared<char>();
     std::string rawText;
     CDrawTools::label label;
     std::int32_t fontNumber = kFont_UIMedium;

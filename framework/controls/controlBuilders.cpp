@@ -5,6 +5,7 @@
 #include "framework/controls/buttons/pushButton.h"
 #include "framework/controls/buttons/toolButton.h"
 #include "framework/controls/dialog.h"
+#include "framework/controls/fields/editNumber.h"
 #include "framework/controls/layoutPane.h"
 #include "framework/controls/menus/menuBar.h"
 #include "framework/controls/menus/menuPopup.h"
@@ -15,6 +16,8 @@
 #include "framework/controls/panes/staticImage.h"
 #include "framework/controls/panes/staticText.h"
 #include "framework/controls/panes/switchPane.h"
+#include "framework/controls/sliders/angleSlider.h"
+#include "framework/controls/sliders/editSlider.h"
 
 namespace Sarnik
 {
@@ -22,6 +25,11 @@ namespace Sarnik
 void enterControlBuilders()
 {
     static const CPaneBuilder<CLayoutPane> pane("CPane");
+    static const CPaneBuilder<CEditString> editString("CEditString");
+    static const CPaneBuilder<CEditNumber> editNumber("CEditNumber");
+    static const CPaneBuilder<CCustomSlider> customSlider("CCustomSlider");
+    static const CPaneBuilder<CEditSlider> editSlider("CEditSlider");
+    static const CPaneBuilder<CAngleSlider> angleSlider("CAngleSlider");
     static const CPaneBuilder<CButton> button("CButton");
     static const CPaneBuilder<CPushButton> pushButton("CPushButton");
     static const CPaneBuilder<CCheckButton> checkButton("CCheckButton");

@@ -15,14 +15,6 @@ constexpr struct
     double size;
 } sizes[] = {{kFont_UI, 13}, {kFont_UILarge, 16}, {kFont_UIMedium, 12}, {kFont_UISmall, 11}, {kFont_UIMicro, 10}};
 
-/// Moved to whole pixels, so that edges are sharp at every scale.
-Platform::rectangle snapped(const CPort &port, const Platform::rectangle &r)
-{
-    const double s = port.Scale();
-    const auto whole = [s](double v) { return std::round(v * s) / s; };
-    return {whole(r.left), whole(r.top), whole(r.right), whole(r.bottom)};
-}
-
 Platform::rectangle shrunk(const Platform::rectangle &r, double by)
 {
     return {r.left + by, r.top + by, r.right - by, r.bottom - by};
@@ -79,14 +71,13 @@ CDrawTools::label CDrawTools::SplitLabel(std::string_view text)
 void CDrawTools::Text(CPort &port, const Platform::rectangle &room, const Platform::textBlock &block,
                       Platform::colour ink, EAlign x, EAlign y)
 {
-    const double s = port.Scale();
     const double left = placed(room.left, room.width(), block.width(), x == kAlign_Default ? kAlign_Near : x);
     const double top = placed(room.top, room.height(), block.height(), y);
     // On a whole pixel the base line is as sharp as the font allows.
-    const double sharp = (std::round((top + block.baseline()) * s)) / s - block.baseline();
+    const Platform::point base = port.Canvas().sharp(Platform::point{left, top + block.baseline()});
     port.Canvas().save();
     port.Canvas().clip(room);
-    port.Canvas().drawText(block, {std::round(left * s) / s, sharp}, ink);
+    port.Canvas().drawText(block, {base.x, base.y - block.baseline()}, ink);
     port.Canvas().restore();
 }
 
@@ -112,7 +103,7 @@ void CDrawTools::Text(CPort &port, const Platform::rectangle &room, std::string_
 void CDrawTools::Face(CPort &port, const Platform::rectangle &r, EFace state, bool prominent, double radius)
 {
     const CPalette &c = Colours();
-    const Platform::rectangle place = snapped(port, r);
+    const Platform::rectangle place = port.Canvas().sharp(r);
     Platform::colour fill = state == EFace::pressed ? c.facePressed : state == EFace::hot ? c.faceHot : c.face;
     if (prominent && state != EFace::disabled)
         fill = state == EFace::pressed ? c.accentPressed : state == EFace::hot ? c.accentHot : c.accent;
@@ -127,35 +118,40 @@ void CDrawTools::Icon(CPort &port, const Platform::rectangle &room, const CIcon 
 {
     if (!icon)
         return;
-    const double s = port.Scale();
-    const double left = std::round(placed(room.left, room.width(), icon.Width(), x) * s) / s;
-    const double top = std::round(placed(room.top, room.height(), icon.Height(), kAlign_Center) * s) / s;
+    const auto [left, top] =
+        port.Canvas().sharp(Platform::point{placed(room.left, room.width(), icon.Width(), x),
+                                            placed(room.top, room.height(), icon.Height(), kAlign_Center)});
     port.Canvas().drawImage(*icon.pixels, icon.pixels->bounds(), {left, top, left + icon.Width(), top + icon.Height()},
-                            icon.scale == s ? Platform::sampling::nearest : Platform::sampling::smooth, strength);
+                            icon.scale == port.Scale() ? Platform::sampling::nearest : Platform::sampling::smooth,
+                            strength);
 }
 
-void CDrawTools::Field(CPort &port, const Platform::rectangle &r, bool enabled)
+void CDrawTools::Field(CPort &port, const Platform::rectangle &r, bool enabled, bool hot)
 {
     const CPalette &c = Colours();
-    const Platform::rectangle place = snapped(port, r);
+    const Platform::rectangle place = port.Canvas().sharp(r);
     const double line = 1 / port.Scale();
-    port.Canvas().fillRounded(place, corner, enabled ? c.edge : c.groove);
+    port.Canvas().fillRounded(place, corner, hot ? c.edgeLight : enabled ? c.edge : c.groove);
     port.Canvas().fillRounded(shrunk(place, line), corner - line, enabled ? c.field : Platform::colour{78, 78, 78});
 }
 
 void CDrawTools::FocusRing(CPort &port, const Platform::rectangle &r, double radius)
 {
-    const Platform::rectangle around = shrunk(snapped(port, r), -ringRoom / 2.0);
-    port.Canvas().drawRounded(around, radius + ringRoom / 2.0, {.ink = Colours().ring, .width = 1.5});
+    // Whole pixels wide, at the outer end of its room.
+    const double scale = port.Scale(), width = std::round(1.5 * scale) / scale;
+    const double out = std::floor((ringRoom - width) * scale) / scale + width / 2;
+    port.Canvas().drawRounded(shrunk(port.Canvas().sharp(r), -out), radius + out,
+                              {.ink = Colours().ring, .width = width});
 }
 
 void CDrawTools::Line(CPort &port, Platform::point from, Platform::point to, Platform::colour ink)
 {
-    const double s = port.Scale(), half = 0.5 / s;
+    const double pixel = 1 / port.Scale();
     const auto middle = [&](Platform::point p) {
-        return Platform::point{std::floor(p.x * s) / s + half, std::floor(p.y * s) / s + half};
+        p = port.Canvas().sharp(p);
+        return Platform::point{p.x + pixel / 2, p.y + pixel / 2};
     };
-    port.Canvas().drawLine(middle(from), middle(to), {.ink = ink, .width = 1 / s});
+    port.Canvas().drawLine(middle(from), middle(to), {.ink = ink, .width = pixel});
 }
 
 void CDrawTools::CheckMark(CPort &port, const Platform::rectangle &r, Platform::colour ink)

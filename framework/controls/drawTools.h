@@ -85,7 +85,7 @@ public:
     static void Icon(CPort &port, const Platform::rectangle &room, const CIcon &icon, EAlign x = kAlign_Center,
                      double strength = 1);
     /// A sunken surface for text and lists.
-    static void Field(CPort &port, const Platform::rectangle &r, bool enabled);
+    static void Field(CPort &port, const Platform::rectangle &r, bool enabled, bool hot = false);
     /// Around r, outside of it, within ringRoom.
     static void FocusRing(CPort &port, const Platform::rectangle &r, double radius = corner);
     /// A line, one pixel wide at every scale.

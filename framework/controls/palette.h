@@ -25,8 +25,9 @@ struct CPalette
     Platform::colour accent{34, 97, 175}; ///< chosen, selected, filled
     Platform::colour accentHot{42, 107, 189};
     Platform::colour accentPressed{26, 78, 145};
-    Platform::colour ring{110, 172, 255};      ///< around what has the focus
-    Platform::colour accentDim{104, 104, 112}; ///< selected in what has no focus
+    Platform::colour accentLight{88, 152, 232}; ///< filled parts of thin lines
+    Platform::colour ring{110, 172, 255};       ///< around what has the focus
+    Platform::colour accentDim{104, 104, 112};  ///< selected in what has no focus
     Platform::colour tip{250, 247, 214};
     Platform::colour tipText{24, 24, 24};
 };

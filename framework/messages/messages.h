@@ -24,7 +24,8 @@ private:
 };
 
 /// Where in a change of its value a control is. Dragging and editing each begin once, go on any number of times, and
-/// end once; the end carries the final value.
+/// end once. The begin carries the value as it was, what follows the new ones, the end the final one, which is the old
+/// one again where the user has given up.
 enum EValuePhase : int
 {
     kValue_Set = 1,       ///< by the program, not by the user
@@ -69,7 +70,7 @@ private:
     EValuePhase phase;
 };
 
-/// With the value: unsigned for what is chosen from a list, CNumber, CObjID, EButtonValue.
+/// With the value: unsigned for what is chosen from a list, CNumber, CObjID, EButtonValue, std::string for typed text.
 template <class T> class CValMsg : public CValueMessage
 {
 public:
@@ -159,6 +160,10 @@ public:
     bool IsDown() const;
     bool IsChar() const;
 
+    /// Who takes a key that goes down keeps it from writing anything, unless the text itself is wanted.
+    void WantText() { textWanted = true; }
+    bool TextWanted() const { return textWanted; }
+
     static const CObjID KeyDown, KeyUp, KeyChar, KeyDeadChar, SysKeyDown, SysKeyUp, SysKeyChar, SysKeyDeadChar;
 
 private:
@@ -166,6 +171,7 @@ private:
     char32_t character;
     std::uint32_t modifiers;
     bool repeat;
+    bool textWanted = false;
 };
 
 /// A scroller has moved. The id is the scroller's.

@@ -342,7 +342,7 @@ void CApplication::HandleKey(const Platform::event &e)
         return;
     }
     if (CWindow *const window = KeyboardWindow(WindowOf(e.window)))
-        swallowText = window->HandleKeyboard(message) && down;
+        swallowText = window->HandleKeyboard(message) && down && !message.TextWanted();
 }
 
 void CApplication::HandleText(const Platform::event &e)

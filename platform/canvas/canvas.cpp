@@ -205,6 +205,19 @@ pixelRect canvas::pixelsAround(const rectangle &r) const
             static_cast<int>(std::ceil(b.y))};
 }
 
+point canvas::sharp(point p) const
+{
+    const point pixels = drawing->toPixels(p);
+    return {std::round(pixels.x) / drawing->scale - drawing->origin.x,
+            std::round(pixels.y) / drawing->scale - drawing->origin.y};
+}
+
+rectangle canvas::sharp(const rectangle &r) const
+{
+    const point a = sharp(point{r.left, r.top}), b = sharp(point{r.right, r.bottom});
+    return {a.x, a.y, b.x, b.y};
+}
+
 void canvas::fill(const path &shape, colour ink)
 {
     if (!drawing->follow(shape))

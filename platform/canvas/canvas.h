@@ -58,6 +58,9 @@ public:
     pixelRect clipBounds() const;
     /// The smallest rectangle of pixels around r.
     pixelRect pixelsAround(const rectangle &r) const;
+    /// Moved so that it lies on the edges between pixels, for shapes with sharp edges at every scale.
+    point sharp(point p) const;
+    rectangle sharp(const rectangle &r) const;
 
     void fill(const path &shape, colour ink);
     void stroke(const path &line, const pen &how);

@@ -1,5 +1,6 @@
 #include "shell/plugin/filter.h"
 
+#include "dialog/tasks/undoCommands.h"
 #include "framework/base/exceptions.h"
 #include "shell/plugin/heapService.h"
 #include "shell/plugin/memoryPlan.h"
@@ -27,6 +28,8 @@ PFilter::~PFilter()
     // Estimations log until they are joined, which the collection's end would be too late for.
     if (kernels)
         kernels->Clear();
+    SetRecorder(nullptr);
+    taskStack.reset(); // holds traces of the collection
     SetTimeLogOwner(nullptr);
     timeLogFile.reset();
     imageHub.reset();
@@ -96,6 +99,26 @@ PKernelCollection *PFilter::GetKernels()
                                                       PreferencesFolder());
     }
     return kernels.get();
+}
+
+PTaskStack *PFilter::GetTaskStack()
+{
+    if (!taskStack)
+    {
+        taskStack = std::make_unique<PTaskStack>();
+        SetRecorder(this);
+    }
+    return taskStack.get();
+}
+
+bool PFilter::ReceiveCommand(Sarnik::CCommandMessage &command)
+{
+    return ReceiveUndoCommand(*this, command);
+}
+
+bool PFilter::UpdateCommand(Sarnik::CCommandMessage &command)
+{
+    return UpdateUndoCommand(*this, command);
 }
 
 PPreferences *PFilter::GetPreferences()

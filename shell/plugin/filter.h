@@ -1,5 +1,7 @@
 #pragma once
 
+#include "dialog/tasks/task.h"
+#include "dialog/tasks/undoEvents.h"
 #include "shell/heapPageStore.h"
 #include "shell/plugin/hostPicture.h"
 #include "shell/plugin/tintorelFilter.h"
@@ -22,7 +24,7 @@ namespace Project
 /// The deblur filter: the one object of a run, which owns all that lives as long as it. What it owns is built when it
 /// is first asked for, so that a run pays for nothing that it does not touch. Main thread; Current(), the parameters
 /// once they exist, and the time log are for any thread while the run lasts.
-class PFilter final : public Sarnik::CTintorelFilter, private PTimeLogOwner, private PTraceEvents
+class PFilter final : public Sarnik::CTintorelFilter, private PTimeLogOwner, private PUndoEvents, private PTaskHost
 {
 public:
     PFilter();
@@ -33,6 +35,8 @@ public:
     PImageHub *GetImageHub();
     PKernelCollection *GetKernels();
     PParams *GetParams();
+    /// From its first use on, what is changed about the traces is recorded. A run without a dialog has none.
+    PTaskStack *GetTaskStack();
     /// Those stored, or fresh ones where they cannot be read.
     PPreferences *GetPreferences();
     /// Where pixmaps keep their pages.
@@ -47,6 +51,13 @@ protected:
     bool DoRun() override;
 
 private:
+    // The end of the chain of commands: undoing.
+    bool ReceiveCommand(Sarnik::CCommandMessage &command) override;
+    bool UpdateCommand(Sarnik::CCommandMessage &command) override;
+    PKernelCollection &Traces() override { return *GetKernels(); }
+    PTaskStack &Tasks() override { return *GetTaskStack(); }
+    PTaskView &View() override { return unseen; }
+
     // filterRun.cpp: the driver.
     bool CheckHostVersion();
     bool CheckImageSize();
@@ -79,6 +90,8 @@ private:
     std::unique_ptr<PImageHub> imageHub;
     std::unique_ptr<PParams> params;
     std::unique_ptr<PPreferences> preferences;
+    std::unique_ptr<PTaskStack> taskStack;
+    PTaskView unseen; ///< while there is no window
     std::unique_ptr<PTimeLogFile> timeLogFile;
     bool applied = false; ///< the result is with the host
     std::unique_ptr<PKernelCollection> kernels;

@@ -24,7 +24,7 @@ constexpr std::uint32_t estimationMask = kMaskMode | kMaskSize | kMaskEstimatorO
 } // namespace
 
 PKernel::PKernel(PKernelCollection &owner, const Sarnik::CRect &rect, const KernelSettings &given)
-    : home(owner), previousSettings(given), region(rect), drawnRegion(rect), settings(given)
+    : home(owner), committedRegion(rect), previousSettings(given), region(rect), drawnRegion(rect), settings(given)
 {
     settings.anchorX = settings.anchorY = 0;
 }
@@ -35,8 +35,9 @@ PKernel::PKernel(PKernelCollection &owner, const PTraceRecord &record) : home(ow
 }
 
 PKernel::PKernel(const PKernel &other)
-    : home(other.home), kernelImage(other.kernelImage), committedRegion(other.committedRegion),
-      previousSettings(other.settings), region(other.region), drawnRegion(other.drawnRegion), settings(other.settings)
+    : home(other.home), kernelImage(other.kernelImage),
+      committedRegion(other.HasKernel() ? other.committedRegion : other.region), previousSettings(other.settings),
+      region(other.region), drawnRegion(other.drawnRegion), settings(other.settings)
 {
 }
 

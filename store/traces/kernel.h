@@ -66,10 +66,12 @@ public:
     const Sarnik::CRect &Region() const { return region; }
     /// As the user drew it, before it grew to fit the kernel.
     const Sarnik::CRect &DrawnRegion() const { return drawnRegion; }
-    /// Of the last finished estimation.
+    /// Of the last finished estimation; without one, as the trace was made.
     const Sarnik::CRect &CommittedRegion() const { return committedRegion; }
     /// Sets the region and the drawn one.
     void SetRegion(const Sarnik::CRect &rect) { region = drawnRegion = rect; }
+    /// Sets all three: for undoing.
+    void RestoreRegion(const Sarnik::CRect &rect) { region = drawnRegion = committedRegion = rect; }
 
     KernelSettings &Settings() { return settings; }
     const KernelSettings &Settings() const { return settings; }

@@ -57,7 +57,7 @@ void PKernelCollection::ListChanges()
     ForgetSolo();
 }
 
-PKernel &PKernelCollection::Insert(std::unique_ptr<PKernel> trace, int at)
+PKernel &PKernelCollection::Insert(std::unique_ptr<PKernel> &&trace, int at)
 {
     ListChanges();
     const int place = at >= 0 && at <= Count() ? at : Count();

@@ -55,8 +55,9 @@ public:
     /// Out of range selects none.
     void Select(int index);
 
-    /// In front of the trace at that index; an index out of range appends. The selection's index stays.
-    PKernel &Insert(std::unique_ptr<PKernel> trace, int at);
+    /// In front of the trace at that index; an index out of range appends. The selection's index stays. Where this
+    /// throws, the trace stays the caller's.
+    PKernel &Insert(std::unique_ptr<PKernel> &&trace, int at);
     /// A copy of the same class, as Insert.
     PKernel &InsertCopy(const PKernel &trace, int at);
     /// Takes it out and puts it in again at `to`; only when both are in range. The selection's index stays.

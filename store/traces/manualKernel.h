@@ -23,6 +23,12 @@ public:
     /// Makes the kernel of the line, and the region and the size that go with it. Equal points are stored and change
     /// nothing else; points that are not finite change nothing at all.
     void SetLine(PLinePoint start, PLinePoint end);
+    /// The points alone, for undoing: their kernel, region and size are restored by themselves.
+    void RestoreLine(PLinePoint start, PLinePoint end)
+    {
+        lineStart = start;
+        lineEnd = end;
+    }
 
 private:
     PLinePoint lineStart, lineEnd;

@@ -46,6 +46,14 @@ Platform::rectangle middleSquare(const Platform::rectangle &r)
     return {left, top, left + side, top + side};
 }
 
+/// The same square on whole pixels, as wide as high.
+Platform::rectangle sharpSquare(const CPort &port, const Platform::rectangle &square)
+{
+    const auto [left, top] = port.Canvas().sharp(Platform::point{square.left, square.top});
+    const double side = std::round(square.width() * port.Scale()) / port.Scale();
+    return {left, top, left + side, top + side};
+}
+
 } // namespace
 
 CLayoutSize CButtonLook::Size(EButtonStyle style, CLayoutSize text, CLayoutSize icon)
@@ -88,15 +96,16 @@ void CButtonLook::Draw(CPort &port, const Platform::rectangle &room) const
 {
     if (isCheck(style) || isRadio(style))
     {
-        const Platform::rectangle box = Mark(room);
+        const Platform::rectangle box = sharpSquare(port, Mark(room));
         DrawMark(port, box);
         DrawContent(port, {box.right + gap, room.top, room.right, room.bottom}, kAlign_Near);
         return;
     }
     if (style == kButtonStyle_Disclosure)
         return DrawDisclosure(port, room);
+    const Platform::rectangle within = shrunk(room, CDrawTools::ringRoom);
     const Platform::rectangle face =
-        isRound(style) ? middleSquare(shrunk(room, CDrawTools::ringRoom)) : shrunk(room, CDrawTools::ringRoom);
+        isRound(style) ? sharpSquare(port, middleSquare(within)) : port.Canvas().sharp(within);
     DrawFace(port, face);
     DrawContent(port, shrunk(face, style == kButtonStyle_Push ? 4 : 0), kAlign_Center);
     if (ring)
@@ -122,7 +131,7 @@ void CButtonLook::DrawMark(CPort &port, const Platform::rectangle &box) const
     if (!enabled)
     {
         edge = c.text.faded(0.2);
-        fill = c.window;
+        fill = fill.faded(0);
     }
     // The edge lies over the fill: it may be transparent.
     port.Canvas().fillRounded(box, radius, fill);

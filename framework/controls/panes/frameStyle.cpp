@@ -82,8 +82,9 @@ EFrameStyle frameStyleOf(std::int32_t number)
     return known ? static_cast<EFrameStyle>(number) : kFrameEmpty;
 }
 
-void drawFrame(CPort &port, const Platform::rectangle &r, EFrameStyle style, bool marked)
+void drawFrame(CPort &port, const Platform::rectangle &place, EFrameStyle style, bool marked)
 {
+    const Platform::rectangle r = port.Canvas().sharp(place);
     const CPalette &c = CDrawTools::Colours();
     const double pixel = 1 / port.Scale();
     constexpr unsigned all = left | top | right | bottom;

@@ -38,7 +38,7 @@ enum EFrameStyle : std::int32_t
 };
 
 /// Draws a frame within a rectangle. `marked`: the focus lies within.
-void drawFrame(CPort &port, const Platform::rectangle &r, EFrameStyle style, bool marked = false);
+void drawFrame(CPort &port, const Platform::rectangle &place, EFrameStyle style, bool marked = false);
 
 /// The style of a number in a layout; kFrameEmpty for one that is none.
 EFrameStyle frameStyleOf(std::int32_t number);

@@ -96,7 +96,7 @@ void CProgressBar::Tick(void *bar)
 void CProgressBar::Draw(CPort &port)
 {
     const CPalette &c = CDrawTools::Colours();
-    const Platform::rectangle track = Track();
+    const Platform::rectangle track = port.Canvas().sharp(Track());
     const double pixel = 1 / port.Scale(), radius = track.height() / 2;
     Platform::path outline;
     outline.addRoundedRectangle(track, radius);

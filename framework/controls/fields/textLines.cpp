@@ -1,0 +1,134 @@
+#include "framework/controls/fields/textLines.h"
+
+#include <algorithm>
+
+namespace Sarnik
+{
+namespace
+{
+
+constexpr std::string_view dot = "\xE2\x80\xA2";
+constexpr double farRight = 1e6;
+
+bool isTail(char byte)
+{
+    return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
+}
+
+} // namespace
+
+void CTextLines::Set(const std::string &newText, const shape &newShape)
+{
+    if (form == newShape && block && laidOut == newText)
+        return;
+    form = newShape;
+    laidOut = newText;
+    block.reset();
+}
+
+const Platform::textBlock &CTextLines::Block() const
+{
+    if (!block)
+    {
+        std::string dots;
+        if (form.dotted)
+            for (const char c : laidOut)
+                if (!isTail(c))
+                    dots += dot;
+        block.emplace(form.dotted ? dots : laidOut, form.font,
+                      Platform::textOptions{.width = form.lines ? form.width : 0,
+                                            .lines = form.lines,
+                                            .align = form.lines ? form.align : Platform::textAlign::left});
+    }
+    return *block;
+}
+
+std::size_t CTextLines::Shown(std::size_t offset) const
+{
+    if (!form.dotted)
+        return offset;
+    const auto end = laidOut.begin() + static_cast<std::ptrdiff_t>(std::min(offset, laidOut.size()));
+    return dot.size() *
+           static_cast<std::size_t>(std::count_if(laidOut.begin(), end, [](char c) { return !isTail(c); }));
+}
+
+std::size_t CTextLines::FromShown(std::size_t offset) const
+{
+    if (!form.dotted)
+        return offset;
+    std::size_t left = offset / dot.size(), at = 0;
+    for (; at < laidOut.size() && (left > 0 || isTail(laidOut[at])); ++at)
+        if (!isTail(laidOut[at]))
+            --left;
+    return at;
+}
+
+double CTextLines::LineHeight() const
+{
+    return Block().caret(0).height();
+}
+
+Platform::rectangle CTextLines::Caret(std::size_t offset) const
+{
+    return Block().caret(Shown(offset));
+}
+
+std::vector<Platform::rectangle> CTextLines::Covered(std::size_t from, std::size_t to) const
+{
+    return Block().covered(Shown(from), Shown(to));
+}
+
+std::size_t CTextLines::OffsetAt(CPoint p) const
+{
+    // In one line, above and below are no directions.
+    return FromShown(Block().offsetAt({p.x, form.lines ? p.y : LineHeight() / 2}));
+}
+
+std::size_t CTextLines::Next(std::size_t offset) const
+{
+    return FromShown(Block().nextCharacter(Shown(offset)));
+}
+
+std::size_t CTextLines::Previous(std::size_t offset) const
+{
+    return FromShown(Block().previousCharacter(Shown(offset)));
+}
+
+std::size_t CTextLines::NextWord(std::size_t offset) const
+{
+    return form.dotted ? laidOut.size() : Block().nextWord(offset);
+}
+
+std::size_t CTextLines::PreviousWord(std::size_t offset) const
+{
+    return form.dotted ? 0 : Block().previousWord(offset);
+}
+
+std::size_t CTextLines::LineStart(std::size_t offset) const
+{
+    if (!form.lines)
+        return 0;
+    const Platform::rectangle at = Caret(offset);
+    return OffsetAt({-1, (at.top + at.bottom) / 2});
+}
+
+std::size_t CTextLines::LineEnd(std::size_t offset) const
+{
+    if (!form.lines)
+        return laidOut.size();
+    const Platform::rectangle at = Caret(offset);
+    const std::size_t end = OffsetAt({farRight, (at.top + at.bottom) / 2});
+    // The end of a line that was broken is the beginning of the next one.
+    return Caret(end).top > at.top + at.height() / 2 ? std::max(Previous(end), offset) : end;
+}
+
+std::size_t CTextLines::Below(std::size_t offset, double x, double by) const
+{
+    const Platform::rectangle at = Caret(offset);
+    const double y = (at.top + at.bottom) / 2 + by;
+    if (y < 0)
+        return 0;
+    return y >= Block().height() ? laidOut.size() : OffsetAt({x, y});
+}
+
+} // namespace Sarnik
