@@ -82,7 +82,7 @@ void PKernelSettingsTask::Swap()
     const int before = host.Traces().SelectedIndex();
     Exchange(*trace);
     ShowListOr(
-        before, [&] { Show(*trace); }, [&] { Exchange(*trace); });
+        before, [&] { Show(); }, [&] { Exchange(*trace); });
 }
 
 void PKernelSettingsTask::Exchange(PKernel &trace)
@@ -107,7 +107,7 @@ void PKernelSettingsTask::Exchange(PKernel &trace)
     region = oldRegion;
 }
 
-void PKernelSettingsTask::Show(const PKernel &trace)
+void PKernelSettingsTask::Show()
 {
     PKernelCollection &traces = host.Traces();
     PTaskView &view = host.View();
@@ -118,7 +118,7 @@ void PKernelSettingsTask::Show(const PKernel &trace)
     }
     if (traces.SelectedIndex() != index)
         Select(index);
-    if (traces.IsActive(traces.IndexOf(&trace)))
+    if (traces.IsActive(index))
         traces.Invalidate(PInvalidation::Normal);
     view.RedrawThumbnail(index);
     view.SyncControls();

@@ -39,7 +39,7 @@ protected:
 private:
     void Swap();
     void Exchange(PKernel &trace);
-    void Show(const PKernel &trace);
+    void Show();
 
     std::uint32_t mask = ~0u; ///< of the settings that it carries: all
     Sarnik::CObjID sourceId;

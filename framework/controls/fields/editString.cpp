@@ -48,11 +48,12 @@ void CEditString::ReplaceText(std::string_view utf8)
 void CEditString::SetEditOptions(std::uint32_t bits)
 {
     editBits = bits;
-    SetMaxCharacters(0);
+    SetMaxCharacters(maxCharacters);
 }
 
 void CEditString::SetMaxCharacters(std::size_t most)
 {
+    maxCharacters = most;
     editor.SetRules(SeveralLines(), most);
     Invalidate();
 }
@@ -204,8 +205,6 @@ void CEditString::Draw(CPort &port)
     }
 
     Platform::canvas &canvas = port.Canvas();
-    const double s = port.Scale();
-    const auto whole = [s](double v) { return std::round(v * s) / s; };
     const CTextLines &lines = Lines();
     const CPoint origin = Origin();
     Platform::rectangle room = TextRoom();
@@ -214,11 +213,12 @@ void CEditString::Draw(CPort &port)
     canvas.clip(room);
     if (HasFocus())
         for (const Platform::rectangle &part : lines.Covered(editor.From(), editor.To()))
-            canvas.fillRectangle({whole(origin.x + part.left), whole(origin.y + part.top), whole(origin.x + part.right),
-                                  whole(origin.y + part.bottom)},
+            canvas.fillRectangle(canvas.sharp(Platform::rectangle{origin.x + part.left, origin.y + part.top,
+                                                                  origin.x + part.right, origin.y + part.bottom}),
                                  colours.accent);
     const double base = lines.Block().baseline();
-    canvas.drawText(lines.Block(), {whole(origin.x), whole(origin.y + base) - base}, Ink());
+    const Platform::point begin = canvas.sharp(Platform::point{origin.x, origin.y + base});
+    canvas.drawText(lines.Block(), {begin.x, begin.y - base}, Ink());
     if (caretShown)
         canvas.fillRectangle(toCanvas(CaretRect()), colours.text);
     canvas.restore();

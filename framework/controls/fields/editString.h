@@ -123,6 +123,7 @@ private:
 
     CTextEditor editor;
     std::uint32_t editBits = 0;
+    std::size_t maxCharacters = 0;
     EAlign align = kAlign_Default;
     std::int32_t growLines[2] = {1, 8}, growWidth[2] = {40, 400}; ///< least and most
     std::string restored;                                         ///< what Escape comes back to

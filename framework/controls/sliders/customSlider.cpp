@@ -149,12 +149,9 @@ void CCustomSlider::Draw(CPort &port)
 {
     const CPalette &colours = CDrawTools::Colours();
     Platform::canvas &canvas = port.Canvas();
-    const double s = port.Scale();
     const bool enabled = IsEnabled(), vertical = IsVertical();
-    const auto whole = [s](double v) { return std::round(v * s) / s; };
     const Platform::rectangle way = Groove();
-    CPoint centre = Centre(Value());
-    centre = {whole(centre.x), whole(centre.y)};
+    const CPoint centre = canvas.sharp(Centre(Value()));
 
     constexpr double half = grooveWidth / 2;
     const Platform::rectangle groove{way.left - half, way.top - half, way.right + half, way.bottom + half};

@@ -107,11 +107,6 @@ CLayoutSize CEditSlider::NaturalSize(const CWyraVariablePropertyList &properties
 void CEditSlider::ReadProperties(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties)
 {
     CControl::ReadProperties(placement, properties);
-    // The tab key's stop is the field's, and what the view is not to take its parts do not.
-    const bool stops = HasOption(kView_TabStop) || !HasOption(kView_NoTabNavigate);
-    field->SetOptions(kView_Target | (stops ? std::uint32_t{kView_TabStop} : 0u));
-    SetOptions(Options() & ~std::uint32_t{kView_Target | kView_TabStop});
-
     const CDrawMeasure measure;
     field->SetFont(FontNumber());
     fieldWidth = fieldWidthOf(properties, FontNumber(), measure);

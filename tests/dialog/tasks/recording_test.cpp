@@ -70,15 +70,19 @@ TEST_F(Recording, TheFirstEstimationsRegionIsKnown)
     PEstimatedKernel made(traces, {}, params.defaultSettings);
     made.SetRegion(drawn);
     Push<PAddKernelTask>(static_cast<const PKernel *>(&made), -1);
-    PKernel &trace = *traces.At(0);
-    Estimated(trace).StartEstimation(PEstimationRun::Background);
-    trace.SetRegion(drawn.Moved(10, 10));
-    Estimated(trace).StartEstimation(PEstimationRun::Background);
-    trace.RecordSettingChange(kMaskGeometry, 0);
-    EXPECT_TRUE(traces.WaitForEstimations());
-    stack->Undo();
-    EXPECT_EQ(trace.Region(), drawn);
-    EXPECT_FALSE(trace.HasKernel());
+    traces.Insert(std::make_unique<PEstimatedKernel>(traces, drawn, params.defaultSettings), 1); // as automatic ones
+    for (int i = 0; i < 2; ++i)
+    {
+        PKernel &trace = *traces.At(i);
+        Estimated(trace).StartEstimation(PEstimationRun::Background);
+        trace.SetRegion(drawn.Moved(10, 10));
+        Estimated(trace).StartEstimation(PEstimationRun::Background);
+        trace.RecordSettingChange(kMaskGeometry, 0);
+        EXPECT_TRUE(traces.WaitForEstimations());
+        stack->Undo();
+        EXPECT_EQ(trace.Region(), drawn);
+        EXPECT_FALSE(trace.HasKernel());
+    }
 }
 
 TEST_F(Recording, ARunOfNudgesIsOneStep)

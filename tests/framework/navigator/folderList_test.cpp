@@ -1,4 +1,5 @@
 #include "framework/base/exceptions.h"
+#include "framework/navigator/fileChoice.h"
 #include "framework/navigator/folderList.h"
 
 #include <gmock/gmock.h>
@@ -66,6 +67,37 @@ TEST_F(Folder, UnderstandsWhatIsTyped)
     EXPECT_EQ(extensionOf("/a.d/B.DBW"), "dbw");
     EXPECT_EQ(extensionOf("/a.d/b"), "");
     EXPECT_EQ(extensionOf(".dbw"), "");
+}
+
+TEST_F(Folder, DecidesAboutATypedName)
+{
+    File("there.dbw");
+    File("other.txt");
+    fs::create_directory(path / "sub");
+    fs::create_directory(path / "locked.dbw");
+    const std::string here = path.string();
+    using outcome = CFileChoice::outcome;
+
+    EXPECT_EQ(choiceToOpen(here, "there.dbw"), (CFileChoice{outcome::take, here + "/there.dbw", {}}));
+    EXPECT_EQ(choiceToOpen(here, "sub/.."), (CFileChoice{outcome::enterFolder, here, {}}));
+    EXPECT_EQ(choiceToOpen(here, "none.dbw").what, outcome::refuse);
+    EXPECT_EQ(choiceToOpen(here, "/dev/null").message, "\"null\" is not a file.");
+
+    const CFileType workspace{"Workspace", {"dbw"}};
+    EXPECT_EQ(choiceToSave(here, "new", workspace), (CFileChoice{outcome::take, here + "/new.dbw", {}}));
+    EXPECT_EQ(choiceToSave(here, "new.DBW", workspace), (CFileChoice{outcome::take, here + "/new.DBW", {}}));
+    EXPECT_EQ(choiceToSave(here, "there", workspace).what, outcome::askToReplace);
+    EXPECT_EQ(choiceToSave(here, "other.txt", workspace), (CFileChoice{outcome::take, here + "/other.txt.dbw", {}}));
+    EXPECT_EQ(choiceToSave(here, "sub", workspace).what, outcome::enterFolder);
+    EXPECT_EQ(choiceToSave(here, "locked", workspace).what, outcome::refuse);
+    EXPECT_EQ(choiceToSave(here, "none/", workspace).what, outcome::refuse);
+    EXPECT_EQ(choiceToSave(here, "none/new", workspace).what, outcome::refuse);
+
+    const CFileType png{"PNG", {"png"}}, any{"All", {}};
+    EXPECT_EQ(nameForType("a.dbw", png, {workspace, png, any}), "a.png");
+    EXPECT_EQ(nameForType("a.b", png, {workspace, png, any}), "a.b.png");
+    EXPECT_EQ(nameForType("a.dbw", any, {workspace, any}), "a.dbw");
+    EXPECT_EQ(nameForType("", png, {workspace}), "");
 }
 
 } // namespace
