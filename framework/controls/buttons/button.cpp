@@ -143,7 +143,7 @@ std::vector<CButton *> CButton::Group()
         return {this};
     for (const auto &child : Container()->Children())
         if (auto *const button = dynamic_cast<CButton *>(child.get());
-            button != nullptr && button->kind == kRadioButton)
+            button != nullptr && button->kind == kRadioButton && button->GroupId() == GroupId())
             group.push_back(button);
     return group;
 }

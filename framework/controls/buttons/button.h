@@ -56,7 +56,9 @@ protected:
 
     /// The user has pressed and released it, `clicks` times in a row. The button may be gone afterwards.
     virtual void Click(int clicks);
-    /// Radio buttons of which one is on, in their order, this one among them: those with the same parent.
+    /// Tells groups with the same parent apart.
+    virtual CObjID GroupId() const { return {}; }
+    /// Radio buttons of which one is on, in their order, this one among them: those of the same parent and id.
     virtual std::vector<CButton *> Group();
     /// The style where the layout has none.
     virtual EButtonStyle OwnStyle() const;

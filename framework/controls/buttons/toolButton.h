@@ -31,6 +31,7 @@ protected:
     void ReadProperties(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) override;
     EButtonStyle OwnStyle() const override { return kButtonStyle_Tool; }
     void Click(int clicks) override;
+    CObjID GroupId() const override { return toolSet; }
     std::vector<CButton *> Group() override;
 
 private:

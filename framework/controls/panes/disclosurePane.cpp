@@ -31,7 +31,6 @@ void CDisclosurePane::Disclose(bool show)
     CRect frame = Frame();
     if (!show)
         fullHeight = Bounds().bottom;
-    // The content keeps its size: it is hidden before the frame shrinks to the heading, whose binding may be any.
     for (std::size_t i = 1; i < Children().size(); ++i)
         Children()[i]->Show(show);
     frame.bottom = CRect::Clamped(std::int64_t{frame.top} + (show ? fullHeight : HeadingHeight()));

@@ -81,7 +81,7 @@ void CStaticText::ReadProperties(const CLayoutPlacement &placement, const CWyraV
     CControl::ReadProperties(placement, properties);
     options = static_cast<std::uint32_t>(ReadFlags(properties, "static_options"));
     alignX = readAlign(properties, "text_align_x", kAlign_Near);
-    alignY = readAlign(properties, "text_align_y", (options & kStatic_Wrap) != 0 ? kAlign_Near : kAlign_Center);
+    alignY = readAlign(properties, "text_align_y", kAlign_Center);
     if (const std::int32_t number = properties.Integer("text_trim", -1); number >= 0 && number <= 3)
         trim = static_cast<Platform::textTrim>(number);
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "framework/controls/buttons/button.h"
+#include "framework/views/timer.h"
 #include "tests/framework/views/stage.h"
 
 namespace Sarnik::Test
@@ -46,23 +47,24 @@ struct controlStage : stage
         control.SetId(CObjID(name));
         return control;
     }
-    /// Calls an action in the middle of a script, where a tracker may run.
+    /// An action in the middle of a script, where a tracker may run.
+    struct call
+    {
+        call(double when, std::function<void()> what) : action(std::move(what)), timer(when, Fire, this)
+        {
+            timer.Start();
+        }
+        static void Fire(void *self)
+        {
+            static_cast<call *>(self)->timer.Stop();
+            static_cast<call *>(self)->action();
+        }
+        std::function<void()> action;
+        CTimer timer;
+    };
     void At(double seconds, std::function<void()> action)
     {
-        struct once : CTimer
-        {
-            once(double when, std::function<void()> what) : CTimer(when, &once::Fire, this), call(std::move(what))
-            {
-                Start();
-            }
-            static void Fire(void *self)
-            {
-                static_cast<once *>(self)->Stop();
-                static_cast<once *>(self)->call();
-            }
-            std::function<void()> call;
-        };
-        calls.push_back(std::make_unique<once>(seconds, std::move(action)));
+        calls.push_back(std::make_unique<call>(seconds, std::move(action)));
     }
     std::int64_t PixelsShown(const std::function<void()> &change)
     {
@@ -74,7 +76,7 @@ struct controlStage : stage
     }
 
     notingHost &pane;
-    std::vector<std::unique_ptr<CTimer>> calls;
+    std::vector<std::unique_ptr<call>> calls;
 };
 
 } // namespace Sarnik::Test
