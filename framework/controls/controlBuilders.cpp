@@ -7,6 +7,9 @@
 #include "framework/controls/dialog.h"
 #include "framework/controls/fields/editNumber.h"
 #include "framework/controls/layoutPane.h"
+#include "framework/controls/menus/menuBar.h"
+#include "framework/controls/menus/menuPopup.h"
+#include "framework/controls/menus/radioPopup.h"
 #include "framework/controls/panes/framePane.h"
 #include "framework/controls/panes/groupPane.h"
 #include "framework/controls/panes/progressBar.h"
@@ -40,6 +43,10 @@ void enterControlBuilders()
     static const CPaneBuilder<CSwitchPane> switchPane("CSwitchPane");
     static const CPaneBuilder<CCasePane> casePane("CCasePane");
     static const CPaneBuilder<CProgressBar> progressBar("CProgressBar");
+    static const CPaneBuilder<CMenuBarPane> menuBarPane("CMenuBarPane");
+    static const CPaneBuilder<CMenuPopup> menuPopup("CMenuPopup");
+    static const CPaneBuilder<CFlyoutPopup> flyoutPopup("CFlyoutPopup");
+    static const CPaneBuilder<CRadioPopup> radioPopup("CRadioPopup");
     static const CWindowBuilder<CDialog> dialog("CDialog"), window("CWindow");
 }
 

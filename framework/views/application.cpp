@@ -219,13 +219,23 @@ bool CApplication::IsPopup(const CWindow &window) const
     return std::find(popups.begin(), popups.end(), &window) != popups.end();
 }
 
-void CApplication::DismissPopups()
+void CApplication::DismissPopups(const CWindow *of)
 {
-    while (!popups.empty())
+    const auto belongs = [of](const CWindow *popup) {
+        for (const CWindow *at = popup->owner; of != nullptr && at != of; at = at->owner)
+            if (at == nullptr)
+                return false;
+        return true;
+    };
+    // From the front; each may take others with it.
+    for (;;)
     {
-        CWindow *const front = popups.back();
-        popups.pop_back();
-        front->Dismiss();
+        const auto front = std::find_if(popups.rbegin(), popups.rend(), belongs);
+        if (front == popups.rend())
+            return;
+        CWindow *const popup = *front;
+        std::erase(popups, popup);
+        popup->Dismiss();
     }
 }
 

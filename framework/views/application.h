@@ -50,7 +50,8 @@ public:
     /// A popup gets every key and sees every press outside of it as a dismissal, in the reverse order of their opening.
     /// It leaves with its closing.
     void PushPopup(CWindow &window) { popups.push_back(&window); }
-    void DismissPopups();
+    /// All of them, or those that a window owns, through other windows too.
+    void DismissPopups(const CWindow *of = nullptr);
 
     /// Notices whether a window was deleted meanwhile.
     class witness

@@ -184,6 +184,12 @@ void CView::SetHelp(std::string enabledText, std::string disabledText)
     helps[1] = std::move(enabledText);
 }
 
+bool CView::TakesAccessKey(char32_t letter) const
+{
+    const char32_t own = AccessKey();
+    return letter != 0 && letter == (own >= U'A' && own <= U'Z' ? own + (U'a' - U'A') : own);
+}
+
 bool CView::GetTip(CPoint, CTip &tip)
 {
     const bool enabled = IsEnabled();

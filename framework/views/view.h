@@ -87,6 +87,9 @@ public:
     virtual bool GetTip(CPoint at, CTip &tip);
     /// Alt with this letter presses the view; 0 for none.
     virtual char32_t AccessKey() const { return 0; }
+    /// For views of several access keys; the letter is lower case.
+    virtual bool TakesAccessKey(char32_t letter) const;
+    virtual void PressAccessKey(char32_t) { Press(); }
     /// Its access key, or as the window's default or cancel view.
     virtual void Press() { SetFocus(); }
 

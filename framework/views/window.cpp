@@ -108,6 +108,8 @@ void CWindow::Close()
     tips.Hide();
     hovered = pressed = nullptr;
     pointerInside = false;
+    if (CApplication *const application = CApplication::Current())
+        application->DismissPopups(this);
     screen.reset();
     End(); // a modal loop, if it is one
     if (CApplication *const application = CApplication::Current())
@@ -207,6 +209,7 @@ CObjID CWindow::RunModal(CWindow *by)
     // The release of a button that is down will not come to where it was pressed.
     for (CWindow *w = application.windows.Head(); w != nullptr; w = w->Next())
         w->pressed = nullptr;
+    application.DismissPopups();
     Open(by);
     const modality held(application, *this);
     while (!Ended())
@@ -260,7 +263,7 @@ void CWindow::Forget(CView &view)
         if (CContext *const above = view.Container())
             above->SetTarget(nullptr);
     }
-    for (CView **const kept : {&hovered, &pressed, &defaultView, &cancelView})
+    for (CView **const kept : {&hovered, &pressed, &defaultView, &cancelView, &menuView})
         drop(*kept);
     if (drag != nullptr)
         drag->Forget(view);

@@ -101,6 +101,8 @@ public:
     /// The views that Enter and Escape press when nobody else wants these keys. Null for none.
     void SetDefaultView(CView *view) { defaultView = view; }
     void SetCancelView(CView *view) { cancelView = view; }
+    /// The one that F10 presses: a menu bar. Null for none.
+    void SetMenuView(CView *view) { menuView = view; }
     CView *Hovered() const { return hovered; }
     /// A subtree is about to go, or to leave.
     void Forget(CView &view);
@@ -114,6 +116,8 @@ public:
     void AddShortcut(CShortcut keys, CObjID command) { shortcuts[keys] = command; }
 
     // Commands go to the view with the focus and up from there.
+    /// That view; the window itself where none has the focus.
+    CMessenger &Leaf();
     bool SendCommand(CObjID command);
     struct commandState
     {
@@ -161,7 +165,6 @@ private:
     void UpdateCursor();
     bool PressAccessKey(char32_t character);
     void SetShowsFocus(bool shows);
-    CMessenger &Leaf();
     void DrawChildren(const CContext &of, Platform::canvas &canvas, std::span<const CRect> parts, const CRect &clip,
                       CPoint origin);
 
@@ -170,7 +173,7 @@ private:
     std::unique_ptr<Platform::window> screen;
     CWindow *owner = nullptr;
     CView *focus = nullptr, *hovered = nullptr, *pressed = nullptr;
-    CView *defaultView = nullptr, *cancelView = nullptr;
+    CView *defaultView = nullptr, *cancelView = nullptr, *menuView = nullptr;
     CTracker *tracker = nullptr;
     CDragSession *drag = nullptr;
     CTipWatch tips{*this};

@@ -108,6 +108,11 @@ bool CWindow::HandleKeyboard(CKeyboardMessage &message)
         return true;
     if (others != 0)
         return false;
+    if (message.Key() == key::f10 && menuView != nullptr && menuView->IsVisible() && menuView->IsEnabled())
+    {
+        menuView->Press();
+        return true;
+    }
     if (message.Key() == key::tab)
         return MoveFocus((message.Modifiers() & Platform::shiftModifier) == 0);
     const bool accept = message.Key() == key::enter || message.Key() == key::keypadEnter;
@@ -126,12 +131,12 @@ bool CWindow::PressAccessKey(char32_t character)
     forEachView(*this, [&](CView &view) {
         if (found != nullptr || view.HasOption(kView_Invisible) || view.HasOption(kView_Disabled))
             return false;
-        if (lowerCase(view.AccessKey()) == lowerCase(character))
+        if (view.TakesAccessKey(lowerCase(character)))
             found = &view;
         return true;
     });
     if (found != nullptr)
-        found->Press();
+        found->PressAccessKey(lowerCase(character));
     return found != nullptr;
 }
 
