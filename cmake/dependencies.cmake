@@ -3,6 +3,7 @@
 find_package(PkgConfig REQUIRED)
 find_package(TBB REQUIRED)
 find_package(PNG 1.6 REQUIRED)
+find_program(RSVG_CONVERT rsvg-convert REQUIRED)
 find_package(CLI11 REQUIRED)
 pkg_check_modules(FFTW3F REQUIRED IMPORTED_TARGET fftw3f)
 pkg_check_modules(VIPS REQUIRED IMPORTED_TARGET vips>=8.14)

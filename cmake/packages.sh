@@ -5,7 +5,7 @@
 buildPackages=(
     g++ cmake ninja-build pkg-config
     libfftw3-dev libtbb-dev libpng-dev libvips-dev liblcms2-dev libcli11-dev
-    libsdl2-dev libcairo2-dev libpango1.0-dev
+    libsdl2-dev libcairo2-dev libpango1.0-dev librsvg2-bin
 )
 # shellcheck disable=SC2034
 testPackages=(libgtest-dev libgmock-dev libbenchmark-dev xvfb clang-format python3)

@@ -9,6 +9,13 @@
 namespace Sarnik
 {
 
+/// The states that pictures exist in. Most have the normal one alone.
+enum EIconState : std::uint32_t
+{
+    kIconState_Normal = 0,
+    kIconState_Pressed = 6 ///< of a flat button
+};
+
 /// A small picture by its name, as controls draw it.
 struct CIcon
 {
@@ -26,8 +33,8 @@ class CIconSource
 public:
     virtual ~CIconSource() = default;
 
-    /// The picture that suits best where a view unit is `scale` pixels. state: 0 the normal one; a source without
-    /// that state gives the normal one.
+    /// The picture that suits best where a view unit is `scale` pixels. A state (EIconState) that
+    /// there is no picture of gives the normal one.
     virtual CIcon Find(std::string_view name, double scale, std::uint32_t state) = 0;
 
     /// Null where nobody has pictures.

@@ -185,7 +185,7 @@ void CButtonLook::DrawFace(CPort &port, const Platform::rectangle &face) const
 
 void CButtonLook::DrawContent(CPort &port, const Platform::rectangle &room, EAlign align) const
 {
-    const CIcon picture = CIconSource::Icon(icon, port.Scale());
+    const CIcon picture = CIconSource::Icon(icon, port.Scale(), pressed ? kIconState_Pressed : kIconState_Normal);
     if (!picture)
         return CDrawTools::Text(port, room, label, font, Ink(), align);
     const double strength = !enabled ? dimmed : style == kButtonStyle_None && pressed ? 0.7 : 1;

@@ -28,7 +28,7 @@ CNumberFormat formatOf(const CWyraVariablePropertyList &properties)
 std::int32_t fieldWidthOf(const CWyraVariablePropertyList &properties, std::int32_t font, const CTextMeasure &measure)
 {
     // Numbers of several sliders in a column are alike where they differ by a digit only.
-    constexpr std::int32_t usual = 48;
+    constexpr std::int32_t usual = 54;
     return std::max(usual, CEditNumber::WidthFor(formatOf(properties), rangeOf(properties), font, measure));
 }
 
