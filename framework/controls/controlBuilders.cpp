@@ -7,15 +7,18 @@
 #include "framework/controls/dialog.h"
 #include "framework/controls/fields/editNumber.h"
 #include "framework/controls/layoutPane.h"
+#include "framework/controls/menus/comboBox.h"
 #include "framework/controls/menus/menuBar.h"
 #include "framework/controls/menus/menuPopup.h"
 #include "framework/controls/menus/radioPopup.h"
+#include "framework/controls/menus/zoomProgressCombo.h"
 #include "framework/controls/panes/framePane.h"
 #include "framework/controls/panes/groupPane.h"
 #include "framework/controls/panes/progressBar.h"
 #include "framework/controls/panes/staticImage.h"
 #include "framework/controls/panes/staticText.h"
 #include "framework/controls/panes/switchPane.h"
+#include "framework/controls/scrolling/listBox.h"
 #include "framework/controls/sliders/angleSlider.h"
 #include "framework/controls/sliders/editSlider.h"
 
@@ -47,6 +50,13 @@ void enterControlBuilders()
     static const CPaneBuilder<CMenuPopup> menuPopup("CMenuPopup");
     static const CPaneBuilder<CFlyoutPopup> flyoutPopup("CFlyoutPopup");
     static const CPaneBuilder<CRadioPopup> radioPopup("CRadioPopup");
+    static const CPaneBuilder<CComboBox> comboBox("CComboBox");
+    static const CPaneBuilder<CZoomProgressCombo> zoomProgressCombo("CZoomProgressCombo");
+    static const CPaneBuilder<CScrollBar> scrollBar("CScrollBar"), customScrollbar("CCustomScrollbar");
+    static const CPaneBuilder<CScroller> scroller("CScroller");
+    static const CPaneBuilder<CCellSheet> cellSheet("CCellSheet");
+    static const CPaneBuilder<CListSheet> listSheet("CListSheet");
+    static const CPaneBuilder<CListBox> listBox("CListBox");
     static const CWindowBuilder<CDialog> dialog("CDialog"), window("CWindow");
 }
 

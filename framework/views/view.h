@@ -110,7 +110,7 @@ public:
     // Told after the fact.
     virtual void FrameChanged() {}
     virtual void FocusChanged(bool) {}
-    /// The focus has come to one of its descendants, or left it.
+    /// The focus has come to one of its descendants, or left it, or is marked otherwise than before.
     virtual void FocusWithinChanged() {}
     /// The view or an ancestor was shown, hidden, enabled or disabled.
     virtual void StateChanged() {}

@@ -50,8 +50,15 @@ bool CWindow::SetFocus(CView *view)
 
 void CWindow::SetShowsFocus(bool shows)
 {
-    if (std::exchange(showsFocus, shows) != shows && focus != nullptr)
+    if (std::exchange(showsFocus, shows) == shows)
+        return;
+    if (focus != nullptr)
         focus->Invalidate();
+    // Some mark the focus around a view within, and a menu bar its access keys.
+    for (CView *at = focus; at != nullptr && at->ParentView() != nullptr; at = at->ParentView())
+        at->ParentView()->FocusWithinChanged();
+    if (menuView != nullptr)
+        menuView->Invalidate();
 }
 
 std::vector<CView *> CWindow::TabOrder() const

@@ -41,7 +41,8 @@ CMenuList::CMenuList(std::vector<CMenuRow> menuRows, std::int32_t fontNumber)
         keysWidth = std::max(keysWidth, widthOf(row.keys, face));
     }
     tops.push_back(y);
-    width = std::min(widest, markWidth + texts + (keysWidth > 0 ? gap + keysWidth : 0) + endWidth);
+    constexpr std::int32_t frame = 2;
+    width = std::min(widest, frame + markWidth + texts + (keysWidth > 0 ? gap + keysWidth : 0) + endWidth);
 }
 
 bool CMenuList::CanChoose(int row) const

@@ -69,8 +69,8 @@ bool CMenuWindow::KeyboardFilter(CKeyboardMessage &message)
     return true;
 }
 
-/// Letters are left to what they write.
-bool CMenuWindow::Key(const CKeyboardMessage &message)
+/// All keys are the menu's; letters come again as what they write.
+bool CMenuWindow::Key(CKeyboardMessage &message)
 {
     using Platform::key;
     const int lit = list->Lit();
@@ -101,7 +101,10 @@ bool CMenuWindow::Key(const CKeyboardMessage &message)
         return true;
     case key::space:
         if (typeAhead.IsUnderWay())
-            return false;
+        {
+            message.WantText();
+            return true;
+        }
         [[fallthrough]];
     case key::enter:
     case key::keypadEnter:
@@ -115,8 +118,9 @@ bool CMenuWindow::Key(const CKeyboardMessage &message)
     }
     if ((message.Modifiers() & Platform::altModifier) != 0 && message.Character() != 0)
         Letter(message.Character());
-    constexpr std::uint32_t notWriting = Platform::altModifier | Platform::ctrlModifier;
-    return (message.Modifiers() & notWriting) != 0 || message.Character() == 0;
+    else
+        message.WantText();
+    return true;
 }
 
 void CMenuWindow::Letter(char32_t letter)

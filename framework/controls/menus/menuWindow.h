@@ -50,7 +50,7 @@ public:
 private:
     CPoint InList(CPoint onScreen) const;
     void Choose(int row);
-    bool Key(const CKeyboardMessage &message);
+    bool Key(CKeyboardMessage &message);
     void Letter(char32_t letter);
 
     CMenuListener &listener;

@@ -49,7 +49,7 @@ protected:
     EFace Face() const;
     /// A face with a text and an arrow, as popups have it.
     void DrawFace(CPort &port, const Platform::rectangle &face, const CDrawTools::label &text) const;
-    static constexpr std::int32_t naturalHeight = 24, arrowWidth = 20, textCushion = 8;
+    static constexpr std::int32_t naturalHeight = 24, arrowWidth = 20, textCushion = 5;
 
 private:
     CPoint OnScreen(CPoint p) const { return Window()->ToScreen(ToWindow(p)); }
