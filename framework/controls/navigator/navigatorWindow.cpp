@@ -5,6 +5,7 @@
 #include "framework/controls/alerts/messageAlert.h"
 #include "framework/controls/buttons/pushButton.h"
 #include "framework/controls/fields/editString.h"
+#include "framework/controls/iconSource.h"
 #include "framework/controls/menus/radioPopup.h"
 #include "framework/controls/navigator/navigator.h"
 #include "framework/controls/scrolling/listBox.h"
@@ -32,6 +33,36 @@ std::string typeText(const CFileType &type)
     return type.extensions.empty() ? text : text + ')';
 }
 
+/// A picture that says what a file holds.
+std::string_view iconOf(const CFolderEntry &entry)
+{
+    if (entry.isFolder)
+        return "Folder";
+    const std::string extension = extensionOf(entry.name);
+    return extension == "dbw" ? "FileWorkspace" : extension == "knl" ? "FileTrace" : "FilePicture";
+}
+
+/// The list: a picture before each name.
+class folderSheet final : public CListSheet
+{
+public:
+    explicit folderSheet(const std::vector<CFolderEntry> &shown) : entries(shown) { SetId(listId); }
+
+protected:
+    void DrawRow(CPort &port, const Platform::rectangle &room, int index, Platform::colour ink) override
+    {
+        constexpr double side = 16, gap = 6;
+        const auto at = static_cast<std::size_t>(index);
+        if (at < entries.size())
+            CDrawTools::Icon(port, {room.left, room.top, room.left + side, room.bottom},
+                             CIconSource::Icon(iconOf(entries[at]), port.Scale()));
+        CListSheet::DrawRow(port, {room.left + side + gap, room.top, room.right, room.bottom}, index, ink);
+    }
+
+private:
+    const std::vector<CFolderEntry> &entries;
+};
+
 } // namespace
 
 CNavigatorWindow::CNavigatorWindow(request wanted) : asked(std::move(wanted))
@@ -43,7 +74,10 @@ CNavigatorWindow::CNavigatorWindow(request wanted) : asked(std::move(wanted))
     Load("CNavigator.wyra");
     if (!asked.title.empty())
         SetTitle(asked.title);
-    list = &Find<CListBox>(listId)->List();
+    CView &place = *FindView("Sarnik/Navigator/ListPlace");
+    auto &box = place.Make<CListBox>(place.Bounds(), std::make_unique<folderSheet>(entries));
+    box.SetBinding(kBind_XSizeable | kBind_YSizeable);
+    list = &box.List();
     name = Find<CEditString>(nameId);
     folders = Find<CRadioPopup>(folderId);
     typePopup = Find<CRadioPopup>(typeId);
@@ -60,10 +94,12 @@ CNavigatorWindow::CNavigatorWindow(request wanted) : asked(std::move(wanted))
     if (asked.saving)
     {
         name->SetValue(nameForType(asked.name, asked.types[asked.typeIndex], asked.types));
+        SetFocus(name);
         // The part that people change.
         name->Select(0, std::min(name->Value().rfind('.'), name->Value().size()));
     }
-    SetFocus(asked.saving ? static_cast<CView *>(name) : list);
+    else
+        SetFocus(list);
 }
 
 bool CNavigatorWindow::Ask(CWindow *over, std::string &path)
@@ -101,7 +137,7 @@ bool CNavigatorWindow::GoTo(const std::string &path, bool complain, const std::s
     {
         if (entry.name == select)
             selected = static_cast<int>(rows.size());
-        rows.push_back(entry.isFolder ? entry.name + '/' : entry.name);
+        rows.push_back(entry.name);
     }
     list->SetTexts(rows);
     if (selected >= 0)

@@ -111,8 +111,8 @@ TEST_F(Navigator, SavesAndAsksBeforeItReplaces)
     };
     {
         CNavigatorWindow w(Saving()); // "photo" is selected: typing replaces it
-        To(w).type("new").tap(key::enter);
-        EXPECT_EQ(Ask(w), "new.dbw");
+        To(w).type("new.and").tap(key::enter);
+        EXPECT_EQ(Ask(w), "new.and.dbw");
     }
     {
         CNavigatorWindow w(Saving());
