@@ -2,7 +2,7 @@
 # Not part of `all`: build the target headers_compile_alone.
 
 stillmark_glob(headers RELATIVE ${PROJECT_SOURCE_DIR}
-    platform/*.h platform/*/*.h deblur/*/*.h framework/*/*.h framework/*/*/*.h store/*.h store/*/*.h stages/*.h stages/*/*.h dialog/*/*.h shell/*.h shell/*/*.h host/*.h host/*/*.h cli/*.h bench/*.h fuzz/*.h tests/*.h tests/*/*.h tests/*/*/*.h)
+    platform/*.h platform/*/*.h deblur/*/*.h framework/*/*.h framework/*/*/*.h store/*.h store/*/*.h stages/*.h stages/*/*.h dialog/*/*.h shell/*.h shell/*/*.h host/*.h host/*/*.h cli/*.h gallery/*.h bench/*.h fuzz/*.h tests/*.h tests/*/*.h tests/*/*/*.h)
 
 set(headerSources)
 foreach(header IN LISTS headers)

@@ -25,7 +25,9 @@ Platform::rectangle CProgressBar::Track() const
 {
     const Platform::rectangle r = toCanvas(Bounds());
     const double height = std::min(highest, r.height()), top = std::floor((r.height() - height) / 2);
-    return {r.left, top, r.right, top + height};
+    // In line with the faces of other controls.
+    constexpr double inset = CDrawTools::ringRoom;
+    return {r.left + inset, top, std::max(r.left + inset, r.right - inset), top + height};
 }
 
 double CProgressBar::FilledTo(double share) const
