@@ -59,7 +59,7 @@ struct menus : stage
                 test.onCommand();
             return true;
         }
-        bool ContextClick(const CMouseEvent &e) override { return context.Open(*test.context, e.at); }
+        bool ContextClick(const CMouseEvent &e) override { return context.Open(*test.context, e); }
 
         menus &test;
         CContextMenu context{*this};
@@ -238,9 +238,13 @@ TEST_F(menus, ContextMenuSendsFromItsViewThatMayGo)
     ASSERT_TRUE(pane.context.IsOpen());
     EXPECT_EQ(pane.context.Popup()->Frame().left, 160);
     EXPECT_EQ(pane.context.Popup()->Frame().top, 110);
+    display.tap(key::escape).tap(key::menu);
+    EXPECT_THAT(Told(), ElementsAre("opens test/context"));
+    EXPECT_EQ(pane.context.Popup()->List().Lit(), 0);
+    EXPECT_EQ(pane.context.Popup()->Frame().left, 110) << "in the middle";
     context.reset(); // an open menu does not need it
     onCommand = [this] { window.Remove(pane); };
-    display.tap(key::down).tap(key::enter);
+    display.tap(key::enter);
     EXPECT_THAT(Told(), ElementsAre("test/delete"));
     EXPECT_EQ(display.windows().size(), 1u);
 }
