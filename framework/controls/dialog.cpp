@@ -3,6 +3,7 @@
 #include "framework/controls/controlBuilders.h"
 #include "framework/controls/drawTools.h"
 #include "framework/controls/layoutPane.h"
+#include "framework/icons/programIcons.h"
 #include "framework/layout/layoutFlags.h"
 #include "framework/layout/layoutResources.h"
 #include "framework/layout/wyraGenerator.h"
@@ -36,6 +37,7 @@ void CDialog::LoadText(std::string_view layout)
     if (HasChildren())
         return;
     enterControlBuilders();
+    CProgramIcons::Get(); // from now on names of icons mean something
     const CDrawMeasure measure;
     CWyraGenerator generator(measure);
     generator.Parse(layout);

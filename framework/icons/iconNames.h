@@ -53,7 +53,6 @@ namespace iconName
 
 inline constexpr std::string_view discloseOn = "DiscloseAdvancedPaneOn";
 inline constexpr std::string_view discloseOff = "DiscloseAdvancedPaneOff";
-inline constexpr std::string_view flyout = "Flyout";                  ///< 16 x 16
 inline constexpr std::string_view zoomIn = "ZoomIn";                  ///< 12 x 12
 inline constexpr std::string_view zoomOut = "ZoomOut";                ///< 12 x 12
 inline constexpr std::string_view undockDetail = "UndockDetail";      ///< 17 x 13, below the loupe
@@ -62,16 +61,6 @@ inline constexpr std::string_view start = "StartEstimation";          ///< 12 x 
 inline constexpr std::string_view reducedQuality = "ReducedQuality";  ///< 16 x 16
 inline constexpr std::string_view closePreview = "CloseMultiPreview"; ///< 16 x 16
 inline constexpr std::string_view useTrace = "UseTrace";              ///< 16 x 16
-inline constexpr std::string_view alertNote = "AlertNote";            ///< 32 x 32
-inline constexpr std::string_view alertQuestion = "AlertQuestion";    ///< 32 x 32
-inline constexpr std::string_view alertWarning = "AlertWarning";      ///< 32 x 32
-inline constexpr std::string_view alertStop = "AlertStop";            ///< 32 x 32
-inline constexpr std::string_view folder = "Folder";                  ///< 16 x 16, as all of a file dialog
-inline constexpr std::string_view folderUp = "FolderUp";
-inline constexpr std::string_view folderHome = "FolderHome";
-inline constexpr std::string_view fileWorkspace = "FileWorkspace";
-inline constexpr std::string_view fileTrace = "FileTrace";
-inline constexpr std::string_view filePicture = "FilePicture";
 
 } // namespace iconName
 
@@ -85,11 +74,8 @@ inline constexpr std::uint32_t numberedIcons[] = {
     kIcon_FixedTraceHot,    kIcon_PoorTrace,       kIcon_PoorTraceApplied, kIcon_Expand,        kIcon_CheckOff,
     kIcon_CheckOn,          kIcon_CheckOffPressed, kIcon_CheckOnPressed,   kIcon_Failed};
 inline constexpr std::string_view namedIcons[] = {
-    iconName::discloseOn,     iconName::discloseOff,  iconName::flyout,        iconName::zoomIn,
-    iconName::zoomOut,        iconName::undockDetail, iconName::dockDetail,    iconName::start,
-    iconName::reducedQuality, iconName::closePreview, iconName::useTrace,      iconName::alertNote,
-    iconName::alertQuestion,  iconName::alertWarning, iconName::alertStop,     iconName::folder,
-    iconName::folderUp,       iconName::folderHome,   iconName::fileWorkspace, iconName::fileTrace,
-    iconName::filePicture};
+    iconName::discloseOn,   iconName::discloseOff, iconName::zoomIn, iconName::zoomOut,
+    iconName::undockDetail, iconName::dockDetail,  iconName::start,  iconName::reducedQuality,
+    iconName::closePreview, iconName::useTrace};
 
 } // namespace Sarnik

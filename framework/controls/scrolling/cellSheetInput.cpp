@@ -129,6 +129,11 @@ int CCellSheet::KeyTarget(const CKeyboardMessage &message) const
     const bool byRows = canUpright && (right || !canSideways);
     const int page = byRows ? std::max(1, static_cast<int>(seen.Height() / g.height) - 1) * upright
                             : std::max(1, static_cast<int>(seen.Width() / g.width) - 1) * sideways;
+    // Without a current cell every arrow finds one, a lone one too.
+    if (now < 0 && (message.Key() == key::right || message.Key() == key::down))
+        return 0;
+    if (now < 0 && (message.Key() == key::left || message.Key() == key::up))
+        return Count() - 1;
     int to = -1;
     switch (message.Key())
     {

@@ -104,13 +104,13 @@ TEST_F(ProgramIcons, AreCursorsOfTheScreensSize)
 
 TEST_F(ProgramIcons, DecodeOrAreAbsentWhateverTheBytes)
 {
-    const auto png = icons.Provider().Find("AlertWarning", kIconResolution_High, 0).png;
-    const Platform::raster whole = CPNGDecoder(64).Decode(png);
-    EXPECT_EQ(whole, *CIconSource::Icon("AlertWarning", 2).pixels);
-    EXPECT_TRUE(CPNGDecoder(63).Decode(png).empty());
+    const auto png = icons.Provider().Find("Alpha_15019", kIconResolution_High, 0).png;
+    const Platform::raster whole = CPNGDecoder(56).Decode(png);
+    EXPECT_EQ(whole, *icons.Icon(kIcon_Enhance, 2).pixels);
+    EXPECT_TRUE(CPNGDecoder(55).Decode(png).empty());
     for (std::size_t length = 0; length < png.size(); ++length)
     {
-        const Platform::raster cut = CPNGDecoder(64).Decode(png.first(length));
+        const Platform::raster cut = CPNGDecoder(56).Decode(png.first(length));
         EXPECT_TRUE(cut.empty() || (cut == whole && length + 12 >= png.size())) << length;
     }
 
@@ -120,8 +120,8 @@ TEST_F(ProgramIcons, DecodeOrAreAbsentWhateverTheBytes)
         std::vector<std::byte> spoilt(png.begin(), png.end());
         for (std::uint32_t n = 1 + random() % 3; n > 0; --n)
             spoilt[random() % spoilt.size()] ^= static_cast<std::byte>(1u << random() % 8);
-        const Platform::raster picture = CPNGDecoder(64).Decode(spoilt);
-        EXPECT_TRUE(picture.width() <= 64 && picture.height() <= 64);
+        const Platform::raster picture = CPNGDecoder(56).Decode(spoilt);
+        EXPECT_TRUE(picture.width() <= 56 && picture.height() <= 56);
     }
 
     const auto index = IconResource(CResourceDataProvider::Icons);

@@ -1,6 +1,6 @@
 #include "framework/base/exceptions.h"
-#include "framework/navigator/fileChoice.h"
-#include "framework/navigator/folderList.h"
+#include "framework/controls/navigator/fileChoice.h"
+#include "framework/controls/navigator/folderList.h"
 
 #include <gmock/gmock.h>
 

@@ -1,4 +1,4 @@
-#include "framework/navigator/fileChoice.h"
+#include "framework/controls/navigator/fileChoice.h"
 
 #include "framework/base/localisedString.h"
 

@@ -1,4 +1,4 @@
-#include "framework/navigator/folderList.h"
+#include "framework/controls/navigator/folderList.h"
 
 #include "framework/base/exceptions.h"
 

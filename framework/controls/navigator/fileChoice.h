@@ -1,6 +1,6 @@
 #pragma once
 
-#include "framework/navigator/folderList.h"
+#include "framework/controls/navigator/folderList.h"
 
 #include <string>
 #include <string_view>
