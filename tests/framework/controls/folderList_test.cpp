@@ -1,6 +1,7 @@
 #include "framework/base/exceptions.h"
 #include "framework/controls/navigator/fileChoice.h"
 #include "framework/controls/navigator/folderList.h"
+#include "tests/support/temporaryFolder.h"
 
 #include <gmock/gmock.h>
 
@@ -17,15 +18,10 @@ namespace fs = std::filesystem;
 
 struct Folder : testing::Test
 {
-    Folder()
-    {
-        fs::remove_all(path);
-        fs::create_directories(path);
-    }
-    ~Folder() override { fs::remove_all(path); }
     void File(const char *name) const { std::ofstream(path / name) << "x"; }
 
-    const fs::path path = fs::path(testing::TempDir()) / "folderList";
+    const TestSupport::temporaryFolder own;
+    const fs::path path = own.path();
 };
 
 TEST_F(Folder, ListsFoldersAndFittingFilesInReadingOrder)

@@ -2,6 +2,7 @@
 #include "framework/controls/navigator/navigatorWindow.h"
 #include "framework/views/timer.h"
 #include "tests/framework/views/stage.h"
+#include "tests/support/temporaryFolder.h"
 
 #include <filesystem>
 #include <fstream>
@@ -19,12 +20,10 @@ struct Navigator : stage
 {
     Navigator()
     {
-        fs::remove_all(folder);
-        fs::create_directories(folder / "sub");
+        fs::create_directory(folder / "sub");
         for (const char *name : {"a.dbw", "b.knl", "sub/c.dbw", "photo.jpg"})
             std::ofstream(folder / name) << "x";
     }
-    ~Navigator() override { fs::remove_all(folder); }
 
     CNavigatorWindow::request Opening() const
     {
@@ -54,7 +53,8 @@ struct Navigator : stage
         return display.to(*asking.Screen());
     }
 
-    const fs::path folder = fs::path(testing::TempDir()) / "navigator";
+    const TestSupport::temporaryFolder own;
+    const fs::path folder = own.path();
 };
 
 TEST_F(Navigator, OpensByKeysAlone)

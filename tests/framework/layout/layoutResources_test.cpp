@@ -99,9 +99,9 @@ INSTANTIATE_TEST_SUITE_P(All, LayoutTexts, testing::ValuesIn(resourceNames), [](
     return std::string(tested.param.substr(0, tested.param.find('.')));
 });
 
-TEST(LayoutResources, AreTheThreeTexts)
+TEST(LayoutResources, AreTheTexts)
 {
-    EXPECT_EQ(LayoutResources().size(), 3u);
+    EXPECT_EQ(LayoutResources().size(), 4u);
     EXPECT_THROW(LayoutResource("None.wyra"), CError);
 }
 
