@@ -328,7 +328,11 @@ TEST_F(menus, LongMenusScroll)
         EXPECT_TRUE(within(list.Lit())) << list.Lit();
     }
     // The arrow at the end scrolls as long as the pointer is on it.
-    display.to(ScreenOf(popup.Popup())).move(20, list.Bounds().bottom - 5).after(20).move(21, list.Bounds().bottom - 5);
+    display.to(ScreenOf(popup.Popup()))
+        .move(20, 50)
+        .move(20, list.Bounds().bottom - 5)
+        .after(20)
+        .move(21, list.Bounds().bottom - 5);
     Run();
     EXPECT_TRUE(within(199));
 }
