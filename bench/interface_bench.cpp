@@ -58,7 +58,7 @@ void interfaceOpen(benchmark::State &state)
     enterStandIns();
     const double scale = static_cast<double>(state.range(0));
     static const double first = [scale] {
-        const stopwatch watch;
+        const Bench::stopwatch watch;
         const openDialog open(scale);
         return watch.read().wall;
     }();
