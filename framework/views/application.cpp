@@ -24,6 +24,9 @@ using Platform::eventKind;
 /// A steady stream of events does not keep the screen from following for longer than this; seconds.
 constexpr double longestUnpainted = 1.0 / 30;
 
+/// Between the keyboard's leaving a window and its coming to the window's popup; seconds.
+constexpr double keyboardGrace = 0.1;
+
 CApplication *currentApplication = nullptr;
 CApplication::witness *witnesses = nullptr;
 
@@ -62,7 +65,10 @@ CApplication::witness::~witness()
     witnesses = outer;
 }
 
-CApplication::CApplication(Platform::display &on) : display(on), previous(std::exchange(currentApplication, this))
+CApplication::CApplication(Platform::display &on)
+    : display(on), previous(std::exchange(currentApplication, this)),
+      losing(
+          keyboardGrace, [](void *application) { static_cast<CApplication *>(application)->KeyboardLost(); }, this)
 {
     CNotifications::SetWaker(wakeDisplay, &display);
 }
@@ -100,6 +106,13 @@ void CApplication::Closed(CWindow &window)
     std::erase(popups, &window);
     if (active == &window)
         active = nullptr;
+    // It does not go back by itself everywhere.
+    if (keyboardPopup == &window)
+    {
+        keyboardPopup = nullptr;
+        if (window.owner != nullptr)
+            window.owner->Activate();
+    }
     for (CWindow *w = windows.Head(); w != nullptr; w = w->Next())
         if (w->owner == &window)
             w->owner = window.owner;
@@ -247,6 +260,18 @@ CWindow *CApplication::WindowOf(Platform::windowId id) const
     return nullptr;
 }
 
+/// The window that a press goes on in: moves and the release are its, also where another window has come under the
+/// pointer and gets them. Null for none.
+CWindow *CApplication::PressHolder() const
+{
+    if (CTracker::Current() != nullptr)
+        return CTracker::Current()->Window();
+    for (CWindow *w = windows.Head(); w != nullptr; w = w->Next())
+        if (w->pressed != nullptr)
+            return w;
+    return nullptr;
+}
+
 void CApplication::Handle(const Platform::event &e)
 {
     CWindow *const window = WindowOf(e.window);
@@ -269,6 +294,16 @@ void CApplication::Handle(const Platform::event &e)
     default:
         break;
     }
+    if (e.kind == eventKind::pointerMove || e.kind == eventKind::pointerUp)
+        if (CWindow *const holder = PressHolder(); holder != nullptr && holder != window)
+        {
+            Platform::event there = e;
+            const CPoint at = window->ToScreen(e.at), corner = holder->ToScreen({});
+            there.window = holder->screen->id();
+            there.at = {at.x - corner.x, at.y - corner.y};
+            holder->Handle(there);
+            return;
+        }
     if (isInput(e.kind))
     {
         if (tracker != nullptr && e.kind == eventKind::close)
@@ -297,15 +332,45 @@ void CApplication::Handle(const Platform::event &e)
 
 void CApplication::HandleFocus(CWindow &window, bool gained)
 {
+    if (IsPopup(window))
+        return HandlePopupFocus(window, gained);
+    if (gained && losing.IsRunning() && active != &window)
+        KeyboardLost();
+    losing.Stop();
     if (gained == (active == &window))
         return;
     if (!gained && CTracker::Current() != nullptr && CTracker::Current()->Window() == &window)
         CTracker::Current()->Abort();
-    if (!gained)
-        DismissPopups();
-    active = gained ? &window : nullptr;
+    if (!gained && !popups.empty())
+        losing.Start();
+    else
+        SetActive(window, gained);
+}
+
+/// Without a window manager, and with some, a popup gets the keyboard though nobody wants that. The window that has
+/// opened it counts as active all the same.
+void CApplication::HandlePopupFocus(CWindow &popup, bool gained)
+{
+    keyboardPopup = gained ? &popup : nullptr;
+    if (gained)
+        losing.Stop();
+    else
+        losing.Start();
+}
+
+void CApplication::KeyboardLost()
+{
+    losing.Stop();
+    DismissPopups();
+    if (active != nullptr)
+        SetActive(*active, false);
+}
+
+void CApplication::SetActive(CWindow &window, bool isActive)
+{
+    active = isActive ? &window : nullptr;
     const witness alive(window);
-    window.ActiveChanged(gained);
+    window.ActiveChanged(isActive);
     if (!alive)
         return;
     // Those that look different.

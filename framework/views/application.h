@@ -1,6 +1,7 @@
 #pragma once
 
 #include "framework/base/link.h"
+#include "framework/views/timer.h"
 #include "platform/window/display.h"
 
 #include <limits>
@@ -81,9 +82,13 @@ private:
     void HandleKey(const Platform::event &e);
     void HandleText(const Platform::event &e);
     void HandleFocus(CWindow &window, bool gained);
+    void HandlePopupFocus(CWindow &popup, bool gained);
+    void KeyboardLost();
+    void SetActive(CWindow &window, bool isActive);
     bool CloseLate();
     bool IsPopup(const CWindow &window) const;
     CWindow *WindowOf(Platform::windowId id) const;
+    CWindow *PressHolder() const;
     CWindow *KeyboardWindow(CWindow *from) const;
     template <class Action> void Guarded(Action action);
 
@@ -94,8 +99,10 @@ private:
     std::vector<std::unique_ptr<CWindow>> leaving; ///< closed, and to be deleted by the loop
     std::vector<Platform::event> closing;          ///< windows to be closed after a tracker
     CWindow *active = nullptr;
-    bool swallowText = false; ///< the key that writes it was used for something else
-    int depth = 0;            ///< of loops within handlers
+    CWindow *keyboardPopup = nullptr; ///< a popup that the keyboard was given to
+    CTimer losing;                    ///< the keyboard has left a window, perhaps for its popup
+    bool swallowText = false;         ///< the key that writes it was used for something else
+    int depth = 0;                    ///< of loops within handlers
 };
 
 } // namespace Sarnik

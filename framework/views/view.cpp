@@ -190,6 +190,11 @@ bool CView::TakesAccessKey(char32_t letter) const
     return letter != 0 && letter == (own >= U'A' && own <= U'Z' ? own + (U'a' - U'A') : own);
 }
 
+CPoint CView::ContextPoint() const
+{
+    return {Bounds().right / 2.0, Bounds().bottom / 2.0};
+}
+
 bool CView::GetTip(CPoint, CTip &tip)
 {
     const bool enabled = IsEnabled();

@@ -102,8 +102,10 @@ public:
     virtual void MouseEnter() {}
     virtual void MouseLeave() {}
     virtual bool MouseWheel(const CMouseEvent &) { return false; }
-    /// A press of the other button, for views with kView_ContextClick.
+    /// A press of the other button or, with the button 0, the menu key, for views with kView_ContextClick.
     virtual bool ContextClick(const CMouseEvent &) { return false; }
+    /// Where the menu key clicks; by default the middle.
+    virtual CPoint ContextPoint() const;
     /// The shape of the pointer over it: false leaves it to the parent.
     virtual bool CursorAt(CPoint, Platform::cursor &) { return false; }
 

@@ -164,6 +164,7 @@ private:
     void Hover(CView *view, const CMouseEvent &e);
     void UpdateCursor();
     bool PressAccessKey(char32_t character);
+    bool ContextClickByKey();
     void SetShowsFocus(bool shows);
     void DrawChildren(const CContext &of, Platform::canvas &canvas, std::span<const CRect> parts, const CRect &clip,
                       CPoint origin);

@@ -109,13 +109,17 @@ bool CWindow::HandleKeyboard(CKeyboardMessage &message)
             SendCommand(command);
         return true;
     }
+    const bool shiftF10 = message.Key() == key::f10 && message.Modifiers() == Platform::shiftModifier;
+    if ((message.Key() == key::menu || shiftF10) && ContextClickByKey())
+        return true;
     const std::uint32_t withAlt = message.Modifiers() & Platform::altModifier;
     const std::uint32_t others = message.Modifiers() & ~std::uint32_t{Platform::shiftModifier};
     if (withAlt != 0 && PressAccessKey(message.Character()))
         return true;
     if (others != 0)
         return false;
-    if (message.Key() == key::f10 && menuView != nullptr && menuView->IsVisible() && menuView->IsEnabled())
+    if (message.Key() == key::f10 && message.Modifiers() == 0 && menuView != nullptr && menuView->IsVisible() &&
+        menuView->IsEnabled())
     {
         menuView->Press();
         return true;
@@ -128,6 +132,19 @@ bool CWindow::HandleKeyboard(CKeyboardMessage &message)
         return false;
     standsFor->Press();
     return true;
+}
+
+bool CWindow::ContextClickByKey()
+{
+    for (CView *view = focus; view != nullptr; view = view->ParentView())
+    {
+        CMouseEvent e;
+        e.at = view->ContextPoint();
+        e.inWindow = view->ToWindow(e.at);
+        if (view->HasOption(kView_ContextClick) && view->ContextClick(e))
+            return true;
+    }
+    return false;
 }
 
 bool CWindow::PressAccessKey(char32_t character)

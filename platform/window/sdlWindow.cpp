@@ -118,8 +118,11 @@ void sdlWindow::show(bool visible)
 
 void sdlWindow::activate()
 {
-    if (link.usable() && isVisible)
-        SDL_RaiseWindow(handle);
+    if (!link.usable() || !isVisible)
+        return;
+    SDL_RaiseWindow(handle);
+    // Without a window manager raising gives no keyboard.
+    SDL_SetWindowInputFocus(handle);
 }
 
 void sdlWindow::capturePointer(bool on)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "framework/controls/menus/menuWindow.h"
+#include "framework/views/mouseEvent.h"
 
 #include <memory>
 #include <vector>
@@ -13,7 +14,7 @@ class CView;
 /// Opens menus over a view that has it as a member, for ContextClick and the menu key. What is open goes with it. The
 /// commands climb from the view. Interface thread.
 ///
-///     bool ContextClick(const CMouseEvent &e) override { return contextMenu.Open(menu, e.at); }
+///     bool ContextClick(const CMouseEvent &e) override { return contextMenu.Open(menu, e); }
 class CContextMenu final : private CMenuListener
 {
 public:
@@ -21,6 +22,8 @@ public:
 
     /// At a point of the view. False where the menu has no rows. The menu may be gone or changed while it is open.
     bool Open(CMenu &menu, CPoint at, bool byKeyboard = false);
+    /// For a ContextClick.
+    bool Open(CMenu &menu, const CMouseEvent &e) { return Open(menu, e.at, e.button == 0); }
     void Close();
     bool IsOpen() const { return popup != nullptr && popup->IsOpen(); }
     CMenuWindow *Popup() const { return IsOpen() ? popup.get() : nullptr; }

@@ -157,6 +157,17 @@ void CMenuList::PointTo(CPoint p)
     ScrollTo(kept);
 }
 
+void CMenuList::MouseMove(const CMouseEvent &e)
+{
+    constexpr double slack = 2;
+    if (!resting)
+        resting = e.at;
+    if (waiting && std::abs(e.at.x - resting->x) <= slack && std::abs(e.at.y - resting->y) <= slack)
+        return;
+    waiting = false;
+    PointTo(e.at);
+}
+
 void CMenuList::PointNowhere()
 {
     timer.Stop();
@@ -165,6 +176,7 @@ void CMenuList::PointNowhere()
 
 bool CMenuList::MouseDown(const CMouseEvent &e)
 {
+    waiting = false;
     PointTo(e.at);
     return true;
 }

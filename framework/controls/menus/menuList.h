@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <vector>
 
 namespace Sarnik
@@ -44,7 +45,10 @@ public:
     void PointNowhere();
 
     void Draw(CPort &port) override;
-    void MouseMove(const CMouseEvent &e) override { PointTo(e.at); }
+    /// The pointer's place counts only once it has moved: keys have opened the menu, perhaps under a pointer that
+    /// rests.
+    void WaitForPointer() { waiting = true; }
+    void MouseMove(const CMouseEvent &e) override;
     void MouseLeave() override { PointNowhere(); }
     bool MouseDown(const CMouseEvent &e) override;
     void MouseUp(const CMouseEvent &e) override;
@@ -71,6 +75,8 @@ private:
     std::int32_t offset = 0;
     int lit = none;
     int scrolling = 0; ///< -1 up, 1 down
+    bool waiting = false;
+    std::optional<CPoint> resting; ///< where the pointer was first seen, while waiting
     CTimer timer;
 };
 

@@ -28,6 +28,13 @@ void CMenuWindow::OpenMenu(CWindow &by, const CRect &anchor, std::int32_t leastW
     list->SetFrame(Bounds());
 }
 
+void CMenuWindow::LightFirst()
+{
+    if (list->Lit() == CMenuList::none)
+        list->Light(list->Neighbour(CMenuList::none, true));
+    list->WaitForPointer();
+}
+
 CPoint CMenuWindow::InList(CPoint onScreen) const
 {
     const CRect frame = Frame();

@@ -36,7 +36,8 @@ public:
     /// By an anchor in view units of the screen; at least as wide as told.
     void OpenMenu(CWindow &by, const CRect &anchor, std::int32_t leastWidth = 0);
     CMenuList &List() const { return *list; }
-    void LightFirst() { list->Light(list->Neighbour(CMenuList::none, true)); }
+    /// Keys have opened it.
+    void LightFirst();
 
     /// While a press outside of it goes on that has opened it: the pointer's place in view units of the screen.
     void DragTo(CPoint onScreen);

@@ -24,7 +24,7 @@ void CPopupControl::OpenPopup(bool byKeyboard)
     popup = std::make_unique<CMenuWindow>(std::move(rows), FontNumber(), static_cast<CMenuListener &>(*this));
     popup->OpenMenu(*Window(), anchor.Moved(std::llround(corner.x), std::llround(corner.y)), PopupWidth());
     popup->List().Light(CurrentRow());
-    if (byKeyboard && popup->List().Lit() == CMenuList::none)
+    if (byKeyboard)
         popup->LightFirst();
     Invalidate();
 }

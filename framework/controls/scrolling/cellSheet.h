@@ -113,6 +113,7 @@ public:
 
     void Draw(CPort &port) override;
     bool MouseDown(const CMouseEvent &e) override;
+    CPoint ContextPoint() const override;
     bool ReceiveKeyboard(CKeyboardMessage &message) override;
     void FrameChanged() override { Invalidate(); }
 
