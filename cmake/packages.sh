@@ -8,7 +8,7 @@ buildPackages=(
     libsdl2-dev libcairo2-dev libpango1.0-dev librsvg2-bin
 )
 # shellcheck disable=SC2034
-testPackages=(libgtest-dev libgmock-dev libbenchmark-dev xvfb clang-format python3)
+testPackages=(libgtest-dev libgmock-dev libbenchmark-dev xvfb xdotool clang-format python3)
 
 # missingPackages PACKAGE...: prints those that are not installed, one a line.
 missingPackages()

@@ -36,6 +36,9 @@ struct sdlDisplay::connection
     std::condition_variable condition;
     std::atomic<bool> woken = false;
 
+    Uint32 clickedWindow = 0;
+    int clicksElsewhere = 0; ///< of those that the library counts, in another window
+
     std::vector<std::string> dropped; ///< files of the drop under way
 };
 

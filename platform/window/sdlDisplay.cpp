@@ -114,6 +114,8 @@ void sdlDisplay::connection::start()
     SDL_SetHint(SDL_HINT_VIDEO_ALLOW_SCREENSAVER, "1");
     SDL_SetHint(SDL_HINT_MOUSE_FOCUS_CLICKTHROUGH, "1");
     SDL_SetHint(SDL_HINT_VIDEO_X11_NET_WM_BYPASS_COMPOSITOR, "0");
+    // Only the parts that have changed go to the screen. Through OpenGL it would be the whole window each time.
+    SDL_SetHint(SDL_HINT_FRAMEBUFFER_ACCELERATION, "0");
     if (SDL_InitSubSystem(SDL_INIT_VIDEO) != 0)
         throw displayError(std::string("There is no display to open a window on: ") + SDL_GetError());
     wakeEvent = SDL_RegisterEvents(1);

@@ -210,7 +210,11 @@ bool translate(sdlDisplay::connection &link, const SDL_Event &from, event &to)
         to.kind = from.type == SDL_MOUSEBUTTONDOWN ? eventKind::pointerDown : eventKind::pointerUp;
         to.at = at(from.button.x, from.button.y);
         to.button = buttonOf(from.button.button);
-        to.clicks = from.button.clicks;
+        // The library goes on counting from one window to the next, in coordinates of either.
+        if (from.button.windowID != link.clickedWindow || from.button.clicks <= link.clicksElsewhere)
+            link.clicksElsewhere = from.button.windowID == link.clickedWindow ? 0 : from.button.clicks - 1;
+        link.clickedWindow = from.button.windowID;
+        to.clicks = from.button.clicks - link.clicksElsewhere;
         return to.button != 0;
     case SDL_MOUSEWHEEL:
     {
