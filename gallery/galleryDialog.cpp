@@ -106,6 +106,7 @@ void galleryDialog::SetHelp(const std::string &text)
 
 bool galleryDialog::ReceiveValue(CValueMessage &message)
 {
+    watch.Look();
     log.Value(message);
     if (const auto *const number = dynamic_cast<const CValMsg<CNumber> *>(&message))
         NumberChanged(*number);
@@ -168,6 +169,9 @@ void galleryDialog::Chosen(const CValMsg<unsigned> &message)
 
 bool galleryDialog::ReceiveMessage(CMessage &message)
 {
+    if (const auto *const scroll = dynamic_cast<const CScrollMessage *>(&message))
+        log.Write("scroll", scroll->Id().Name(),
+                  std::to_string(static_cast<int>(scroll->X())) + ',' + std::to_string(static_cast<int>(scroll->Y())));
     if (message.Id() != CDisclosurePane::Changed)
         return false;
     stackColumn(*FindView("gallery/lastColumn"), 0, 8);

@@ -19,24 +19,38 @@ std::string written(const CRect &r)
            std::to_string(r.bottom);
 }
 
-} // namespace
+/// Empty for a view without a name. The parts of controls have the same names in all of them: theirs go behind the
+/// control's.
+std::string nameOf(const CView &view)
+{
+    if (!view.Id())
+        return {};
+    std::string name = view.Id().Name();
+    for (const CView *above = view.ParentView(); above != nullptr && name.starts_with("Sarnik/");
+         above = above->ParentView())
+        if (above->Id())
+            name = above->Id().Name() + name.substr(name.rfind('/'));
+    return name;
+}
 
-void viewWatch::Look(const CContext &within, std::map<CObjID, std::string> &found) const
+void findPlaces(const CContext &within, std::map<std::string, std::string> &found)
 {
     for (const auto &view : within.Children())
     {
         const CRect seen = view->VisibleInWindow();
-        if (view->Id() && seen.Width() > 0 && seen.Height() > 0)
-            found.emplace(view->Id(), written(seen));
-        Look(*view, found);
+        if (const std::string name = nameOf(*view); !name.empty() && seen.Width() > 0 && seen.Height() > 0)
+            found.emplace(name, written(seen));
+        findPlaces(*view, found);
     }
 }
 
-bool viewWatch::Idle()
+} // namespace
+
+void viewWatch::Look()
 {
     const CWindow *const now = CApplication::Current()->Modal();
     if (!log.IsOn() || now == nullptr || now->Screen() == nullptr)
-        return false;
+        return;
     if (now != window)
     {
         window = now;
@@ -52,25 +66,23 @@ bool viewWatch::Idle()
         log.Write("window", newWhere);
     where = newWhere;
 
-    std::map<CObjID, std::string> found;
-    Look(*now, found);
-    for (const auto &[id, place] : found)
-        if (const auto old = places.find(id); old == places.end() || old->second != place)
-            log.Write("place", id.Name(), place);
-    for (const auto &[id, place] : places)
-        if (!found.contains(id))
-            log.Write("place", id.Name(), "-");
+    std::map<std::string, std::string> found;
+    findPlaces(*now, found);
+    for (const auto &[name, place] : found)
+        if (const auto old = places.find(name); old == places.end() || old->second != place)
+            log.Write("place", name, place);
+    for (const auto &[name, place] : places)
+        if (!found.contains(name))
+            log.Write("place", name, "-");
     places = std::move(found);
 
-    // A part without an id counts as the whole: the field of an edit slider.
     const CView *view = now->Focus();
     while (view != nullptr && !view->Id())
         view = view->ParentView();
-    const std::string newFocus = view == nullptr ? "-" : view->Id().Name();
+    const std::string newFocus = view == nullptr ? "-" : nameOf(*view);
     if (newFocus != focus)
         log.Write("focus", newFocus);
     focus = newFocus;
-    return false;
 }
 
 } // namespace Stillmark

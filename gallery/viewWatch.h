@@ -1,6 +1,5 @@
 #pragma once
 
-#include "framework/messages/objectId.h"
 #include "framework/views/idler.h"
 #include "gallery/messageLog.h"
 
@@ -9,9 +8,8 @@
 
 namespace Sarnik
 {
-class CContext;
 class CWindow;
-} // namespace Sarnik
+}
 
 namespace Stillmark
 {
@@ -23,14 +21,20 @@ class viewWatch final : public Sarnik::CIdler
 public:
     explicit viewWatch(const messageLog &to) : log(to) {}
 
+    /// Before anything else is written that follows from it.
+    void Look();
+
 private:
-    bool Idle() override;
-    void Look(const Sarnik::CContext &within, std::map<Sarnik::CObjID, std::string> &found) const;
+    bool Idle() override
+    {
+        Look();
+        return false;
+    }
 
     const messageLog &log;
     const Sarnik::CWindow *window = nullptr;
     std::string where, focus;
-    std::map<Sarnik::CObjID, std::string> places;
+    std::map<std::string, std::string> places; ///< by the views' names
 };
 
 } // namespace Stillmark

@@ -76,15 +76,17 @@ void CWindow::Open(CWindow *by)
     owner = by;
     try
     {
+        Platform::display &display = application.Display();
+        const CRect frame = settings.frame;
         Platform::windowSettings wanted{.title = localised(settings.title),
                                         .kind = settings.kind,
                                         .resizable = (settings.features & kWin_CanSize) != 0,
                                         .placed = true,
-                                        .place = toCanvas(settings.frame),
+                                        .place = toCanvas(placed(frame, display.workArea())),
                                         .owner = owner == nullptr ? nullptr : owner->screen.get()};
-        screen = application.Display().open(wanted);
-        // Only now is it known how large the screen is.
-        settings.frame = placed(settings.frame, application.Display().workArea());
+        screen = display.open(wanted);
+        // Before the first window the size of the screen is a guess.
+        settings.frame = placed(frame, display.workArea());
         if (toCanvas(settings.frame) != wanted.place)
             screen->setPlace(toCanvas(settings.frame));
     }
@@ -198,7 +200,11 @@ CObjID CWindow::RunModal(CWindow *by)
         ~modality()
         {
             std::erase(application.modal, &window);
+            CWindow *const owner = window.IsActive() ? window.owner : nullptr;
             window.Close();
+            // Not every window manager hands the keyboard back, and there may be none.
+            if (owner != nullptr)
+                owner->Activate();
         }
         CApplication &application;
         CWindow &window;

@@ -2,6 +2,10 @@
 
 #include <SDL_syswm.h>
 
+#if defined(SDL_VIDEO_DRIVER_X11)
+#include <X11/Xproto.h>
+#endif
+
 #include <dlfcn.h>
 
 namespace Platform
@@ -18,10 +22,12 @@ namespace
 // functions by name keeps it out of what the plug-in needs in order to load.
 using errorHandler = int (*)(Display *);
 using exitHandler = void (*)(Display *, void *);
+using requestHandler = int (*)(Display *, XErrorEvent *);
 
 Display *watched = nullptr;
 std::atomic<std::atomic<bool> *> toldOfLoss = nullptr;
 errorHandler before = nullptr;
+requestHandler requestBefore = nullptr;
 
 template <class Function> Function libraryFunction(const char *name)
 {
@@ -36,6 +42,24 @@ template <class Function> Function libraryFunction(const char *name)
 int connectionFailed(Display *which)
 {
     return which != watched && before != nullptr ? before(which) : 0;
+}
+
+/// A request that names a window which has gone meanwhile, or one that is not shown yet, also ends the process by
+/// default. SDL makes such requests, on a second connection that it keeps to itself, as a popup closes while a key is
+/// on its way to it. They come to nothing; all other errors go on to whoever had them before.
+int requestFailed(Display *which, XErrorEvent *error)
+{
+    const bool late = error->error_code == BadWindow || error->error_code == BadDrawable ||
+                      (error->error_code == BadMatch && error->request_code == X_SetInputFocus);
+    return late || requestBefore == nullptr ? 0 : requestBefore(which, error);
+}
+
+/// Puts back the handler from before ours, unless somebody else's came after it.
+template <class Handler> void restore(const char *setter, Handler ours, Handler old)
+{
+    const auto set = libraryFunction<Handler (*)(Handler)>(setter);
+    if (const Handler last = set(old); last != ours)
+        set(last);
 }
 
 void connectionEnded(Display *, void *)
@@ -54,12 +78,14 @@ void watchConnection(SDL_Window *window, std::atomic<bool> &lost)
         return;
     const auto setExit = libraryFunction<void (*)(Display *, exitHandler, void *)>("XSetIOErrorExitHandler");
     const auto setError = libraryFunction<errorHandler (*)(errorHandler)>("XSetIOErrorHandler");
-    if (setExit == nullptr || setError == nullptr)
+    const auto setRequest = libraryFunction<requestHandler (*)(requestHandler)>("XSetErrorHandler");
+    if (setExit == nullptr || setError == nullptr || setRequest == nullptr)
         return;
     watched = info.info.x11.display;
     toldOfLoss = &lost;
     setExit(watched, connectionEnded, nullptr);
     before = setError(connectionFailed);
+    requestBefore = setRequest(requestFailed);
 }
 
 void unwatchConnection()
@@ -68,9 +94,8 @@ void unwatchConnection()
         return;
     watched = nullptr;
     toldOfLoss = nullptr;
-    const auto setError = libraryFunction<errorHandler (*)(errorHandler)>("XSetIOErrorHandler");
-    if (const errorHandler last = setError(before); last != connectionFailed)
-        setError(last); // somebody else's came after ours
+    restore("XSetIOErrorHandler", connectionFailed, before);
+    restore("XSetErrorHandler", requestFailed, requestBefore);
 }
 
 #else
