@@ -9,7 +9,6 @@
 
 #include <gtest/gtest.h>
 #include <random>
-#include <regex>
 
 using namespace Sarnik;
 
@@ -30,13 +29,13 @@ std::vector<std::string> wantedNames(const CResourceDataProvider &provider)
     for (const std::uint32_t id : numberedIcons)
         provider.GetIconName(id, names.emplace_back());
 
-    const std::regex icon("\\bicon: '([^']*)'");
+    constexpr std::string_view before = " icon: '";
     for (const auto &layout : LayoutResources())
-    {
-        const std::string text(layout.text);
-        for (std::sregex_iterator at(text.begin(), text.end(), icon), end; at != end; ++at)
-            names.push_back((*at)[1]);
-    }
+        for (std::size_t at = 0; (at = layout.text.find(before, at)) != std::string_view::npos;)
+        {
+            at += before.size();
+            names.emplace_back(layout.text.substr(at, layout.text.find('\'', at) - at));
+        }
     return names;
 }
 
