@@ -211,8 +211,10 @@ bool translate(sdlDisplay::connection &link, const SDL_Event &from, event &to)
         to.at = at(from.button.x, from.button.y);
         to.button = buttonOf(from.button.button);
         // The library goes on counting from one window to the next, in coordinates of either.
-        if (from.button.windowID != link.clickedWindow || from.button.clicks <= link.clicksElsewhere)
-            link.clicksElsewhere = from.button.windowID == link.clickedWindow ? 0 : from.button.clicks - 1;
+        if (link.clickedWindow != 0 && link.clickedWindow != from.button.windowID)
+            link.clicksElsewhere = from.button.clicks - 1;
+        else if (from.button.clicks <= link.clicksElsewhere)
+            link.clicksElsewhere = 0;
         link.clickedWindow = from.button.windowID;
         to.clicks = from.button.clicks - link.clicksElsewhere;
         return to.button != 0;

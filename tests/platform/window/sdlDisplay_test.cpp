@@ -147,6 +147,28 @@ TEST(sdlDisplay, TranslatesWhatTheLibraryTells)
     waker.join();
 }
 
+TEST(sdlDisplay, CountsTheClicksOfEachWindowForItself)
+{
+    setenv("SDL_VIDEODRIVER", "dummy", 1);
+    sdlDisplay display;
+    const auto first = display.open({.place = {0, 0, 50, 50}}), second = display.open({.place = {0, 0, 50, 50}});
+    const std::pair<window *, int> clicks[] = {{first.get(), 1},  {first.get(), 2},  {second.get(), 3},
+                                               {second.get(), 4}, {second.get(), 1}, {second.get(), 2}};
+    gather(display, 0.02);
+    for (const auto &[where, told] : clicks)
+    {
+        SDL_Event e{};
+        e.type = SDL_MOUSEBUTTONDOWN;
+        e.button.windowID = where->id(), e.button.button = SDL_BUTTON_LEFT;
+        e.button.clicks = static_cast<Uint8>(told);
+        SDL_PushEvent(&e);
+    }
+    std::vector<int> counted;
+    for (const event &e : gather(display, 0.05))
+        counted.push_back(e.clicks);
+    EXPECT_EQ(counted, (std::vector<int>{1, 2, 1, 2, 1, 2}));
+}
+
 /// A virtual screen of our own.
 struct virtualScreen
 {
