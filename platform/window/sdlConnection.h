@@ -50,11 +50,14 @@ bool translate(sdlDisplay::connection &link, const SDL_Event &from, event &to);
 std::uint32_t modifiersOf(SDL_Keymod state);
 SDL_Scancode scancodeOf(key k);
 
+/// From now on requests to an X11 server that come too late do not end the process. To be called before SDL starts,
+/// which puts back what it found as it leaves, with some answers still to come.
+void watchRequests();
 /// From now on the end of an X11 connection sets the flag instead of ending the process. Does nothing under other
 /// window systems.
 void watchConnection(SDL_Window *window, std::atomic<bool> &lost);
-/// As it was before.
-void unwatchConnection();
+/// Both as before.
+void unwatch();
 
 class sdlWindow final : public window
 {

@@ -116,6 +116,7 @@ void sdlDisplay::connection::start()
     SDL_SetHint(SDL_HINT_VIDEO_X11_NET_WM_BYPASS_COMPOSITOR, "0");
     // Only the parts that have changed go to the screen. Through OpenGL it would be the whole window each time.
     SDL_SetHint(SDL_HINT_FRAMEBUFFER_ACCELERATION, "0");
+    watchRequests();
     if (SDL_InitSubSystem(SDL_INIT_VIDEO) != 0)
         throw displayError(std::string("There is no display to open a window on: ") + SDL_GetError());
     wakeEvent = SDL_RegisterEvents(1);
@@ -132,13 +133,15 @@ sdlDisplay::sdlDisplay() : link(std::make_unique<connection>())
 
 sdlDisplay::~sdlDisplay()
 {
-    unwatchConnection();
+    if (link->usable())
+    {
+        if (link->shownCursor != nullptr)
+            SDL_FreeCursor(link->shownCursor);
+        SDL_QuitSubSystem(SDL_INIT_VIDEO);
+    }
+    // Not before: as the library leaves, it hears what came of its last requests.
+    unwatch();
     libraryUnusable = libraryUnusable || link->isLost;
-    if (!link->usable())
-        return;
-    if (link->shownCursor != nullptr)
-        SDL_FreeCursor(link->shownCursor);
-    SDL_QuitSubSystem(SDL_INIT_VIDEO);
 }
 
 bool sdlDisplay::started() const

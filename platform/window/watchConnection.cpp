@@ -18,25 +18,27 @@ namespace
 
 // By default the X library ends the process when its server goes, in two places: in the handler of such errors, which
 // is one for the process, and after it, in a second one of each connection. Both are replaced, the first for our
-// connection only: a host may have one of its own. The library is there already, loaded by SDL; asking for its
-// functions by name keeps it out of what the plug-in needs in order to load.
+// connection only: a host may have one of its own. Asking for the library's functions by name keeps it out of what the
+// plug-in needs in order to load. It is held until the handlers are back, as SDL leaves it first.
 using errorHandler = int (*)(Display *);
 using exitHandler = void (*)(Display *, void *);
 using requestHandler = int (*)(Display *, XErrorEvent *);
 
 Display *watched = nullptr;
+void *library = nullptr;
 std::atomic<std::atomic<bool> *> toldOfLoss = nullptr;
 errorHandler before = nullptr;
 requestHandler requestBefore = nullptr;
 
 template <class Function> Function libraryFunction(const char *name)
 {
-    void *const library = dlopen("libX11.so.6", RTLD_LAZY | RTLD_NOLOAD);
-    if (library == nullptr)
-        return nullptr;
-    const auto function = reinterpret_cast<Function>(dlsym(library, name));
+    return reinterpret_cast<Function>(dlsym(library, name));
+}
+
+void leaveLibrary()
+{
     dlclose(library);
-    return function;
+    library = nullptr;
 }
 
 int connectionFailed(Display *which)
@@ -45,8 +47,8 @@ int connectionFailed(Display *which)
 }
 
 /// A request that names a window which has gone meanwhile, or one that is not shown yet, also ends the process by
-/// default. SDL makes such requests, on a second connection that it keeps to itself, as a popup closes while a key is
-/// on its way to it. They come to nothing; all other errors go on to whoever had them before.
+/// default. SDL makes such requests, on a second connection that it keeps to itself, to wake itself in a window that is
+/// about to close. They come to nothing; all other errors go on to whoever had them before.
 int requestFailed(Display *which, XErrorEvent *error)
 {
     const bool late = error->error_code == BadWindow || error->error_code == BadDrawable ||
@@ -70,40 +72,57 @@ void connectionEnded(Display *, void *)
 
 } // namespace
 
+void watchRequests()
+{
+    if (library != nullptr)
+        return;
+    library = dlopen("libX11.so.6", RTLD_LAZY);
+    if (library == nullptr)
+        return;
+    const auto set = libraryFunction<requestHandler (*)(requestHandler)>("XSetErrorHandler");
+    if (set == nullptr)
+        return leaveLibrary();
+    requestBefore = set(requestFailed);
+}
+
 void watchConnection(SDL_Window *window, std::atomic<bool> &lost)
 {
     SDL_SysWMinfo info;
     SDL_VERSION(&info.version);
-    if (watched != nullptr || SDL_GetWindowWMInfo(window, &info) != SDL_TRUE || info.subsystem != SDL_SYSWM_X11)
+    if (library == nullptr || watched != nullptr || SDL_GetWindowWMInfo(window, &info) != SDL_TRUE ||
+        info.subsystem != SDL_SYSWM_X11)
         return;
     const auto setExit = libraryFunction<void (*)(Display *, exitHandler, void *)>("XSetIOErrorExitHandler");
     const auto setError = libraryFunction<errorHandler (*)(errorHandler)>("XSetIOErrorHandler");
-    const auto setRequest = libraryFunction<requestHandler (*)(requestHandler)>("XSetErrorHandler");
-    if (setExit == nullptr || setError == nullptr || setRequest == nullptr)
+    if (setExit == nullptr || setError == nullptr)
         return;
     watched = info.info.x11.display;
     toldOfLoss = &lost;
     setExit(watched, connectionEnded, nullptr);
     before = setError(connectionFailed);
-    requestBefore = setRequest(requestFailed);
 }
 
-void unwatchConnection()
+void unwatch()
 {
-    if (watched == nullptr)
-        return;
+    if (watched != nullptr)
+        restore("XSetIOErrorHandler", connectionFailed, before);
     watched = nullptr;
     toldOfLoss = nullptr;
-    restore("XSetIOErrorHandler", connectionFailed, before);
+    if (library == nullptr)
+        return;
     restore("XSetErrorHandler", requestFailed, requestBefore);
+    leaveLibrary();
 }
 
 #else
 
+void watchRequests()
+{
+}
 void watchConnection(SDL_Window *, std::atomic<bool> &)
 {
 }
-void unwatchConnection()
+void unwatch()
 {
 }
 
