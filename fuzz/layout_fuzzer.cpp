@@ -24,7 +24,6 @@ struct evenMeasure final : CTextMeasure
 /// Reads what real classes read of each kind, and counts the views of a tree.
 struct plainView final : CLayoutView
 {
-    bool HasChildren() const override { return views > 1; }
     void TakeLayout(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) override
     {
         require(placement.frame.left <= placement.frame.right && placement.frame.top <= placement.frame.bottom);

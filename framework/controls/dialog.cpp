@@ -27,14 +27,14 @@ void tellDone(const CContext &context)
 
 } // namespace
 
-void CDialog::Load(std::string_view resourceName)
+void CDialog::LoadLayout(std::string_view resourceName)
 {
     LoadText(LayoutResource(resourceName));
 }
 
 void CDialog::LoadText(std::string_view layout)
 {
-    if (HasChildren())
+    if (!Children().empty())
         return;
     enterControlBuilders();
     CProgramIcons::Get(); // from now on names of icons mean something

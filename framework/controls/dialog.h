@@ -11,7 +11,7 @@ namespace Sarnik
 /// A window that a layout fills: the classes "CDialog" and "CWindow" of layouts. Interface thread.
 ///
 ///     CDialog dialog;
-///     dialog.Load("PParamDialog.wyra");
+///     dialog.LoadLayout("PParamDialog.wyra");
 ///     if (dialog.RunModal(owner) == okButton) ...
 class CDialog : public CWindow, public CLayoutView
 {
@@ -20,11 +20,10 @@ public:
 
     /// Builds the views of a layout among the program's resources. Does nothing to a dialog with views. Throws CError
     /// where there is no such layout, CLayoutError where its text is of no use.
-    void Load(std::string_view resourceName);
+    void LoadLayout(std::string_view resourceName);
     /// The same from a text.
     void LoadText(std::string_view layout);
 
-    bool HasChildren() const override { return !Children().empty(); }
     /// Id, title, features, position and size.
     void TakeLayout(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) override;
     void AdoptChild(std::unique_ptr<CLayoutView> child, std::int32_t interior) override;

@@ -28,7 +28,6 @@ public:
     /// The size without children; nothing by default.
     static CLayoutSize NaturalSize(const CWyraVariablePropertyList &, const CTextMeasure &) { return {}; }
 
-    bool HasChildren() const override { return !Children().empty(); }
     /// Frame, id, options, binding, tips and help; then ReadProperties.
     void TakeLayout(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) final;
     /// Puts the child in front of the others. Throws CLayoutError for one that is no view.

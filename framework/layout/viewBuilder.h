@@ -45,7 +45,6 @@ class CLayoutView
 public:
     virtual ~CLayoutView() = default;
 
-    virtual bool HasChildren() const = 0;
     /// Called once, before any child is adopted. Nothing of `properties` may be kept but copies.
     virtual void TakeLayout(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) = 0;
     /// Called once for each child, after the child has taken its own layout and adopted its own children. `interior`:

@@ -1,7 +1,6 @@
 #include "framework/layout/wyraGenerator.h"
 
 #include "framework/layout/layoutError.h"
-#include "framework/layout/layoutResources.h"
 #include "framework/layout/viewGeometry.h"
 
 #include <utility>
@@ -93,16 +92,6 @@ void CWyraGenerator::GenerateViews(CLayoutView &window)
     window.TakeLayout(placementOf(root, {0, 0, size.width, size.height}), root.Properties());
     for (const auto &child : root.children)
         build(*child, {}, window);
-}
-
-void LoadLayout(CLayoutView &window, std::string_view resourceName, const CTextMeasure &measure,
-                const CViewBuilderMap &builders)
-{
-    if (window.HasChildren())
-        return;
-    CWyraGenerator generator(measure, builders);
-    generator.Parse(LayoutResource(resourceName));
-    generator.GenerateViews(window);
 }
 
 } // namespace Sarnik

@@ -48,10 +48,4 @@ private:
     bool measured = false;
 };
 
-/// Opens the layout of a window that has no children yet: finds the text among the layout resources, parses it, and
-/// builds the views in the window. Does nothing to a window with children. Throws CError where there is no such
-/// resource, CLayoutError where its text is of no use.
-void LoadLayout(CLayoutView &window, std::string_view resourceName, const CTextMeasure &measure,
-                const CViewBuilderMap &builders = CViewBuilderMap::Global());
-
 } // namespace Sarnik

@@ -71,7 +71,7 @@ CNavigatorWindow::CNavigatorWindow(request wanted) : asked(std::move(wanted))
         asked.types.push_back(allFiles);
     asked.typeIndex = std::min(asked.typeIndex, asked.types.size() - 1);
 
-    Load("CNavigator.wyra");
+    LoadLayout("CNavigator.wyra");
     if (!asked.title.empty())
         SetTitle(asked.title);
     CView &place = *FindView("Sarnik/Navigator/ListPlace");

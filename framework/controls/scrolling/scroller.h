@@ -70,7 +70,6 @@ public:
     /// As ScrollTo, by the user: the message tells.
     void UserScrollTo(CPoint to);
 
-    bool HasChildren() const override { return content != nullptr; }
     void FrameChanged() override { Arrange(); }
     void FocusWithinChanged() override { Invalidate(); }
     void Draw(CPort &port) override;

@@ -1,3 +1,4 @@
+#include "framework/base/exceptions.h"
 #include "framework/controls/buttons/checkButton.h"
 #include "framework/controls/buttons/iconButton.h"
 #include "framework/controls/dialog.h"
@@ -150,6 +151,11 @@ TEST(paneLayouts, TextsAreAsLargeAsTheirWords)
     EXPECT_EQ(dialog.Find<CFramePane>("frame")->FrameStyle(), kFrameScrollerWell);
     EXPECT_EQ(dialog.FindView("switch")->Bounds().bottom, 40);
     EXPECT_EQ(dialog.Find<CSwitchPane>("switch")->Current(), CObjID("x"));
+
+    dialog.LoadLayout("PParamDialog.wyra"); // it has views: nothing happens
+    EXPECT_EQ(dialog.Children().size(), 1u);
+    EXPECT_EQ(dialog.FindView("Project/ParamDialog/OkButton"), nullptr);
+    EXPECT_THROW(CDialog().LoadLayout("None.wyra"), CError);
 }
 
 } // namespace

@@ -16,7 +16,6 @@ namespace Sarnik
 class noteView final : public CLayoutView
 {
 public:
-    bool HasChildren() const override { return !children.empty(); }
     void TakeLayout(const CLayoutPlacement &taken, const CWyraVariablePropertyList &properties) override
     {
         placement = taken;
