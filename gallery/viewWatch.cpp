@@ -61,7 +61,7 @@ void viewWatch::Look()
     const CPoint corner = now->ToScreen({});
     const std::string newWhere = std::to_string(static_cast<int>(corner.x)) + ',' +
                                  std::to_string(static_cast<int>(corner.y)) + ',' +
-                                 std::to_string(now->Screen()->scale()) + ',' + localised(now->Settings().title);
+                                 std::to_string(now->Screen()->scale()) + ',' + Localize(now->Settings().title);
     if (newWhere != where)
         log.Write("window", newWhere);
     where = newWhere;

@@ -171,8 +171,8 @@ bool PImageHub::RenderWithDialog(PProgressWindow &window)
     bool open = false;
     const auto show = [&](std::uint64_t done, std::uint64_t total) {
         if (!open)
-            window.Open(Sarnik::localised("$$$/Deblur/Final/Progress/Title=Progress"),
-                        Sarnik::localised(message, {std::to_string(traces)}), done, total);
+            window.Open(Sarnik::Localize("$$$/Deblur/Final/Progress/Title=Progress"),
+                        Sarnik::Localize(message, {std::to_string(traces)}), done, total);
         else
             window.Show(done, total);
         open = true;

@@ -23,7 +23,7 @@ constexpr std::size_t kLargestFile = 1 << 20;
 
 std::string FileIn(const std::string &directory)
 {
-    return directory + "/" + Sarnik::localised("$$$/Deblur/Prefs/FileName=Stillmark Prefs.tnp");
+    return directory + "/" + Sarnik::Localize("$$$/Deblur/Prefs/FileName=Stillmark Prefs.tnp");
 }
 
 } // namespace
@@ -32,9 +32,9 @@ std::string PreferencesDirectory(const std::string &dataFolder)
 {
     const std::string release = kReleaseWord;
     const std::filesystem::path directory =
-        std::filesystem::path(dataFolder) / Sarnik::localised("$$$/private/Prefs/Directory/Corvane=Corvane") /
-        (Sarnik::localised("$$$/private/Prefs/Directory/SubDir=Corvane Tintorel ") + release) /
-        (Sarnik::localised("$$$/private/Prefs/Directory/Tintorel=Corvane Tintorel ") + release + " Settings");
+        std::filesystem::path(dataFolder) / Sarnik::Localize("$$$/private/Prefs/Directory/Corvane=Corvane") /
+        (Sarnik::Localize("$$$/private/Prefs/Directory/SubDir=Corvane Tintorel ") + release) /
+        (Sarnik::Localize("$$$/private/Prefs/Directory/Tintorel=Corvane Tintorel ") + release + " Settings");
     std::filesystem::create_directories(directory);
     return directory.string();
 }

@@ -38,12 +38,12 @@ constexpr hostMessage hostMessages[] = {
 
 std::string CException::GetTaskString() const
 {
-    return localised(TaskText());
+    return Localize(TaskText());
 }
 
 std::string CException::GetErrorString() const
 {
-    return localised(ErrorText());
+    return Localize(ErrorText());
 }
 
 std::string CException::TaskText() const

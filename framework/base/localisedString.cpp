@@ -108,12 +108,12 @@ std::string filled(std::string_view text, controls how, std::initializer_list<st
 
 } // namespace
 
-std::string localised(std::string_view keyAndText)
+std::string Localize(std::string_view keyAndText)
 {
-    return localised(keyAndText, {});
+    return Localize(keyAndText, {});
 }
 
-std::string localised(std::string_view keyAndText, std::initializer_list<std::string_view> parameters)
+std::string Localize(std::string_view keyAndText, std::initializer_list<std::string_view> parameters)
 {
     if (!keyAndText.starts_with("$$$"))
         return filled(keyAndText, controls::plain, parameters);

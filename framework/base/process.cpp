@@ -16,7 +16,7 @@ std::atomic<std::thread::id> mainThread;
 
 CAlertAnswer CProcess::Alert(CAlertKind kind, std::string_view text) const
 {
-    return Alerts().Show({kind, localised(ProcessName()), std::string(text), {}});
+    return Alerts().Show({kind, Localize(ProcessName()), std::string(text), {}});
 }
 
 void CProcess::StoreMainThread() noexcept

@@ -20,13 +20,13 @@ void show(const CException &exception)
         return Alerts().Beep();
 
     CAlert alert;
-    alert.title = localised("$$$/Sarnik/Reporter/Title=Error");
+    alert.title = Localize("$$$/Sarnik/Reporter/Title=Error");
     alert.first = exception.GetTaskString();
     alert.second = exception.GetErrorString();
     if (alert.first.empty())
         std::swap(alert.first, alert.second);
     if (alert.first.empty())
-        alert.first = localised("$$$/Sarnik/Reporter/Default=The operation could not be completed.");
+        alert.first = Localize("$$$/Sarnik/Reporter/Default=The operation could not be completed.");
     Alerts().Show(alert);
 }
 

@@ -10,7 +10,7 @@ void CControl::SetText(std::string text)
     if (text == rawText)
         return;
     rawText = std::move(text);
-    label = CDrawTools::SplitLabel(localised(rawText));
+    label = CDrawTools::SplitLabel(Localize(rawText));
     Invalidate();
 }
 

@@ -81,7 +81,7 @@ std::string_view CWyraVariablePropertyList::Text(std::string_view name) const
 
 std::string CWyraVariablePropertyList::LocalisedText(std::string_view name) const
 {
-    return localised(Text(name));
+    return Localize(Text(name));
 }
 
 double CWyraVariablePropertyList::Number(std::string_view name, double otherwise) const

@@ -12,7 +12,7 @@ bool NameInto(const CTask &task, const char *pattern, std::string &text)
     std::string name;
     if (!task.GetName(name))
         return false;
-    text = localised(pattern, {localised(name)});
+    text = Localize(pattern, {Localize(name)});
     return true;
 }
 

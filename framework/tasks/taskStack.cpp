@@ -19,7 +19,7 @@ bool CTaskStack::GetUndoText(std::string &text) const
         text = "$$$/Sarnik/Tasks/CannotUndo=Cannot Undo";
     else if (!undoList.Head()->GetUndoText(text))
         text = "$$$/Sarnik/Tasks/Undo=Undo";
-    text = localised(text);
+    text = Localize(text);
     return CanUndo();
 }
 
@@ -29,7 +29,7 @@ bool CTaskStack::GetRedoText(std::string &text) const
         text = "$$$/Sarnik/Tasks/CannotRedo=Cannot Redo";
     else if (!redoList.Head()->GetRedoText(text))
         text = "$$$/Sarnik/Tasks/Redo=Redo";
-    text = localised(text);
+    text = Localize(text);
     return CanRedo();
 }
 

@@ -77,7 +77,7 @@ void CTipWatch::Moved(CView *view, CPoint to)
             tip.help = std::move(answer.help);
     }
 
-    std::string newHelp = localised(tip.help);
+    std::string newHelp = Localize(tip.help);
     if (newHelp != help)
         window.SetHelp(help = std::move(newHelp));
 
@@ -110,7 +110,7 @@ void CTipWatch::ShowNow()
     done = true;
     if (text.empty() || !window.IsVisible())
         return;
-    Platform::textBlock block = laidOut(localised(text));
+    Platform::textBlock block = laidOut(Localize(text));
     const auto width = static_cast<std::int32_t>(std::ceil(block.width() + 2 * cushion));
     const auto height = static_cast<std::int32_t>(std::ceil(block.height() + 2 * cushion));
 

@@ -78,7 +78,7 @@ void CWindow::Open(CWindow *by)
     {
         Platform::display &display = application.Display();
         const CRect frame = settings.frame;
-        Platform::windowSettings wanted{.title = localised(settings.title),
+        Platform::windowSettings wanted{.title = Localize(settings.title),
                                         .kind = settings.kind,
                                         .resizable = (settings.features & kWin_CanSize) != 0,
                                         .placed = true,
@@ -145,7 +145,7 @@ void CWindow::SetTitle(std::string title)
 {
     settings.title = std::move(title);
     if (IsOpen())
-        screen->setTitle(localised(settings.title));
+        screen->setTitle(Localize(settings.title));
 }
 
 /// The user may have moved it.

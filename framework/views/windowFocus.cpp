@@ -183,7 +183,7 @@ CWindow::commandState CWindow::QueryCommand(CObjID command)
     CCommandMessage message(command, CCommandMessage::purpose::update);
     if (!Leaf().Dispatch(message))
         return {};
-    return {message.enabled, message.checked, localised(message.text)};
+    return {message.enabled, message.checked, Localize(message.text)};
 }
 
 } // namespace Sarnik

@@ -10,7 +10,7 @@ namespace Project
 {
 
 using Sarnik::CAlertKind;
-using Sarnik::localised;
+using Sarnik::Localize;
 
 namespace
 {
@@ -43,8 +43,8 @@ bool PFilter::CheckHostVersion()
 {
     if (BehavioralParametersExist(PreferencesFolder()) || supportsHostVersion(Properties().Number(TN_PROPERTY_VERSION)))
         return true;
-    Alert(CAlertKind::Ok, localised("$$$/Deblur/Warning/UnsupportedVersion="
-                                    "The plug-in is not supported by this version of Tintorel."));
+    Alert(CAlertKind::Ok, Localize("$$$/Deblur/Warning/UnsupportedVersion="
+                                   "The plug-in is not supported by this version of Tintorel."));
     return false;
 }
 
@@ -54,9 +54,9 @@ bool PFilter::CheckImageSize()
     if (bounds.Width() >= smallestSide && bounds.Height() >= smallestSide)
         return true;
     Alert(CAlertKind::Ok,
-          localised("$$$/Deblur/Dialog/sizeWarningText=Images/selections with dimension smaller than ^0 pixels are not "
-                    "supported by Stillmark.",
-                    {std::to_string(smallestSide)}));
+          Localize("$$$/Deblur/Dialog/sizeWarningText=Images/selections with dimension smaller than ^0 pixels are not "
+                   "supported by Stillmark.",
+                   {std::to_string(smallestSide)}));
     return false;
 }
 

@@ -108,9 +108,9 @@ bool PFilter::ReadDescriptor(PParams &record)
     {
         autoMode = true;
         if (Alert(Sarnik::CAlertKind::YesNo,
-                  Sarnik::localised("$$$/Deblur/Dialog/loadActionSizeWarning=The image size stored in the action is "
-                                    "different from the current image. Would you like to ignore the recorded settings "
-                                    "and estimate blur trace automatically?")) == Sarnik::CAlertAnswer::No)
+                  Sarnik::Localize("$$$/Deblur/Dialog/loadActionSizeWarning=The image size stored in the action is "
+                                   "different from the current image. Would you like to ignore the recorded settings "
+                                   "and estimate blur trace automatically?")) == Sarnik::CAlertAnswer::No)
             return false;
     }
     record.fineResult = found->fineResult;

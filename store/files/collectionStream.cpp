@@ -24,7 +24,7 @@ void ReadTraces(PKernelCollection &collection, Sarnik::CContainer &in, std::uint
         // Compared with the position in the file, although earlier rejections have lowered the selection already.
         if (std::int64_t{i} <= selected)
             --selected;
-        collection.SetLastError(Sarnik::localised(
+        collection.SetLastError(Sarnik::Localize(
             "$$$/Deblur/Dialog/WorkspaceLoadBoundsError=Some of the traces were not loaded because their estimation "
             "regions are out of image bounds."));
     }

@@ -33,7 +33,7 @@ bool LoadFile(PKernelCollection &collection, const std::string &path,
     {
     }
     if (!done && collection.GetLastError().empty())
-        collection.SetLastError(Sarnik::localised(kUnrecognizedFormat));
+        collection.SetLastError(Sarnik::Localize(kUnrecognizedFormat));
     return done;
 }
 

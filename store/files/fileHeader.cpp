@@ -37,20 +37,20 @@ void WriteHeader(std::int32_t width, std::int32_t height, Sarnik::CContainer &ou
 
 void ReadHeader(PKernelCollection &collection, Sarnik::CContainer &in)
 {
-    using Sarnik::localised;
+    using Sarnik::Localize;
     const std::uint32_t signature = in.ReadU32();
     if (in.ReadU32() != kVersionSignature || signature != kSignature)
-        return collection.SetLastError(localised(kUnrecognizedFormat));
+        return collection.SetLastError(Localize(kUnrecognizedFormat));
     collection.SetVersion(in.ReadU16());
 
     const std::int32_t width = in.ReadI32();
     const std::int32_t height = in.ReadI32();
     const Sarnik::CRect bounds = collection.Picture().Bounds();
     if (width != bounds.Width() || height != bounds.Height())
-        collection.SetLastError(localised("$$$/Deblur/Warning/UnmatchedImageWidth=Image size doesn't match.") + "\n" +
-                                localised("$$$/Deblur/Warning/UnmatchedValueInFile=Value in the loaded file: ") +
+        collection.SetLastError(Localize("$$$/Deblur/Warning/UnmatchedImageWidth=Image size doesn't match.") + "\n" +
+                                Localize("$$$/Deblur/Warning/UnmatchedValueInFile=Value in the loaded file: ") +
                                 SizeText(width, height) + "\n" +
-                                localised("$$$/Deblur/Warning/UnmatchedValueInDoc=Value of the current image: ") +
+                                Localize("$$$/Deblur/Warning/UnmatchedValueInDoc=Value of the current image: ") +
                                 SizeText(bounds.Width(), bounds.Height()));
 }
 

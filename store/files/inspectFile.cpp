@@ -146,7 +146,7 @@ void LoadPreferencesContent(Sarnik::CMemoryContainer &content, PInspection &insp
         return;
     inspection.preferences.reset();
     inspection.version.reset();
-    inspection.error = Sarnik::localised(kUnrecognizedFormat);
+    inspection.error = Sarnik::Localize(kUnrecognizedFormat);
 }
 
 } // namespace
@@ -173,8 +173,8 @@ PInspection InspectFile(const std::string &path, std::optional<PImageSize> size)
         LoadPreferencesContent(content, inspection);
         break;
     case PInspection::Kind::Unknown:
-        inspection.error = Sarnik::localised("$$$/Deblur/Dialog/FileLoadError=Not a Workspace file or a Blur Trace "
-                                             "file.");
+        inspection.error = Sarnik::Localize("$$$/Deblur/Dialog/FileLoadError=Not a Workspace file or a Blur Trace "
+                                            "file.");
         break;
     }
     return inspection;

@@ -130,8 +130,8 @@ bool ReadKernelPng(floatArray &destination, int maxSize, Sarnik::CContainer &in,
     in.ReadBytes(std::as_writable_bytes(std::span(signature)));
     if (png_sig_cmp(signature.data(), 0, signature.size()) != 0)
     {
-        message = Sarnik::localised("$$$/Deblur/Error/ReadKernelDataFromPNG/InvalidSinature=Invalid file format: "
-                                    "support files in 16-bit gray-scale PNG format only.");
+        message = Sarnik::Localize("$$$/Deblur/Error/ReadKernelDataFromPNG/InvalidSinature=Invalid file format: "
+                                   "support files in 16-bit gray-scale PNG format only.");
         return false;
     }
 
@@ -141,7 +141,7 @@ bool ReadKernelPng(floatArray &destination, int maxSize, Sarnik::CContainer &in,
         return false;
     if (const char *refusal = refusalOf(header, maxSize))
     {
-        message = Sarnik::localised(refusal, {std::to_string(kSmallestKernelPng)});
+        message = Sarnik::Localize(refusal, {std::to_string(kSmallestKernelPng)});
         return false;
     }
 

@@ -56,8 +56,8 @@ bool LoadTrace(PKernelCollection &collection, const std::string &path, int at)
         if (!RegionFits(collection, *trace))
         {
             collection.SetLastError(
-                Sarnik::localised("$$$/Deblur/Error/LoadKernel/ErrRegionOutOfBounds=Invalid file format: the blur "
-                                  "trace region is out of the image bounds."));
+                Sarnik::Localize("$$$/Deblur/Error/LoadKernel/ErrRegionOutOfBounds=Invalid file format: the blur "
+                                 "trace region is out of the image bounds."));
             return false;
         }
         Add(collection, std::move(trace), at);

@@ -62,7 +62,7 @@ CMessageAlert::CMessageAlert(CWindow *parentWindow, CAlertIcon icon, std::vector
                              const std::string &text, const std::string &subtext, const std::string &title,
                              CObjID defaultAnswer)
     : CDialog({.title = title, .features = kWin_CanClose | kWin_CanMove, .background = CDrawTools::Colours().window}),
-      parent(parentWindow), buttons(std::move(with)), texts{localised(text), localised(subtext)}
+      parent(parentWindow), buttons(std::move(with)), texts{Localize(text), Localize(subtext)}
 {
     const bool cancels = std::any_of(buttons.begin(), buttons.end(),
                                      [](const CAlertButton &b) { return b.answer == CAlertButton::Cancel; });
@@ -98,8 +98,7 @@ void CMessageAlert::Build(CAlertIcon icon, CObjID defaultAnswer)
     std::int32_t total = 0;
     for (const CAlertButton &button : buttons)
     {
-        widths.push_back(
-            std::max(leastButtonWidth, measure.Measure(localised(button.text), kFont_UIMedium).width + 32));
+        widths.push_back(std::max(leastButtonWidth, measure.Measure(Localize(button.text), kFont_UIMedium).width + 32));
         total += widths.back() + buttonGap;
     }
     const std::int32_t width = std::max(left + textWidth + margin, total - buttonGap + 2 * margin);

@@ -141,9 +141,9 @@ bool CEditNumber::ReceiveMessage(CMessage &message)
         return false;
     Alerts().Show({.kind = CAlertKind::Ok,
                    .title = {},
-                   .first = localised("$$$/Sarnik/EditNumber/OutOfRange=A number from ^0 to ^1 is needed here. The "
-                                      "nearest one was taken.",
-                                      {format.Text(range.least), format.Text(range.most)}),
+                   .first = Localize("$$$/Sarnik/EditNumber/OutOfRange=A number from ^0 to ^1 is needed here. The "
+                                     "nearest one was taken.",
+                                     {format.Text(range.least), format.Text(range.most)}),
                    .second = {}});
     return true;
 }

@@ -83,7 +83,7 @@ void CEditString::ReadProperties(const CLayoutPlacement &placement, const CWyraV
     growWidth[0] =
         std::clamp(properties.Integer("min_grow_width", static_cast<std::int32_t>(Frame().Width())), 1, 10000);
     growWidth[1] = std::clamp(properties.Integer("max_grow_width", 400), growWidth[0], 10000);
-    SetValue(localised(Text()));
+    SetValue(Localize(Text()));
 }
 
 CLayoutSize CEditString::NaturalSize(const CWyraVariablePropertyList &properties, const CTextMeasure &measure)

@@ -49,7 +49,7 @@ std::vector<CMenuRow> CMenu::Rows(CMessenger &from)
         }
         CCommandMessage asked(i.command, CCommandMessage::purpose::update);
         const bool known = i.command && from.Dispatch(asked);
-        rows.push_back({.text = CDrawTools::SplitLabel(localised(asked.text.empty() ? i.text : asked.text)),
+        rows.push_back({.text = CDrawTools::SplitLabel(Localize(asked.text.empty() ? i.text : asked.text)),
                         .keys = i.keys.Text(),
                         .enabled = known && asked.enabled,
                         .checked = known && asked.checked,

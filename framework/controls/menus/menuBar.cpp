@@ -60,7 +60,7 @@ void CMenuBarPane::Arrange()
     if (bar != nullptr)
         for (const auto &menu : bar->Menus())
         {
-            CDrawTools::label text = CDrawTools::SplitLabel(localised(menu->Title()));
+            CDrawTools::label text = CDrawTools::SplitLabel(Localize(menu->Title()));
             const auto width = static_cast<std::int32_t>(std::ceil(Platform::textBlock(text.text, Font()).width()));
             titles.push_back(
                 {std::move(text), {x, 0, x + width + 2 * titleCushion, Bounds().bottom}, !menu->IsEmpty()});

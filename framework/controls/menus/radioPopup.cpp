@@ -43,7 +43,7 @@ void CRadioPopup::EnableItem(unsigned index, bool enabled)
 
 std::string CRadioPopup::ItemText(unsigned index) const
 {
-    return index < items.size() ? CDrawTools::SplitLabel(localised(items[index])).text : std::string();
+    return index < items.size() ? CDrawTools::SplitLabel(Localize(items[index])).text : std::string();
 }
 
 void CRadioPopup::SetValue(unsigned index)
@@ -59,7 +59,7 @@ std::vector<CMenuRow> CRadioPopup::PopupRows()
     std::vector<CMenuRow> rows;
     for (unsigned i = 0; i < items.size(); ++i)
     {
-        CMenuRow row{.text = CDrawTools::SplitLabel(localised(items[i])),
+        CMenuRow row{.text = CDrawTools::SplitLabel(Localize(items[i])),
                      .keys = {},
                      .enabled = ItemEnabled(i),
                      .checked = i == value,

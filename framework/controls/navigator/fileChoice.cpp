@@ -20,7 +20,7 @@ CFileChoice refused(const std::string &path, int error)
 
 CFileChoice refused(const std::string &path, std::string_view pattern)
 {
-    return {CFileChoice::outcome::refuse, path, localised(pattern, {fileNameOf(path)})};
+    return {CFileChoice::outcome::refuse, path, Localize(pattern, {fileNameOf(path)})};
 }
 
 constexpr std::string_view notAFile = "$$$/Sarnik/Navigator/NotAFile=\"^0\" is not a file.";

@@ -27,7 +27,7 @@ const CFileType allFiles{"$$$/Sarnik/Navigator/AllFiles=All files", {}};
 /// "Workspace (.dbw)".
 std::string typeText(const CFileType &type)
 {
-    std::string text = localised(type.label);
+    std::string text = Localize(type.label);
     for (std::size_t i = 0; i < type.extensions.size(); ++i)
         text += (i == 0 ? " (." : ", .") + type.extensions[i];
     return type.extensions.empty() ? text : text + ')';
@@ -206,8 +206,8 @@ void CNavigatorWindow::Take(const std::string &typed)
         CMessageAlert question(this, CAlertIcon::warning,
                                {{CAlertButton::Ok, "$$$/Sarnik/Navigator/ReplaceButton=&Replace"},
                                 {CAlertButton::Cancel, "$$$/Sarnik/Alert/CancelButton=Cancel"}},
-                               localised("$$$/Sarnik/Navigator/ReplaceText=\"^0\" is there already. Replace it?",
-                                         {fileNameOf(choice.path)}),
+                               Localize("$$$/Sarnik/Navigator/ReplaceText=\"^0\" is there already. Replace it?",
+                                        {fileNameOf(choice.path)}),
                                "$$$/Sarnik/Navigator/ReplaceSubtext=What it holds now will be lost.", Settings().title,
                                CAlertButton::Cancel);
         if (question.Run() != CAlertButton::Ok)

@@ -24,7 +24,7 @@ void CGroupPane::SetText(std::string text)
     if (text == rawText)
         return;
     rawText = std::move(text);
-    title = CDrawTools::SplitLabel(localised(rawText));
+    title = CDrawTools::SplitLabel(Localize(rawText));
     Invalidate();
 }
 

@@ -110,7 +110,7 @@ void CEditSlider::ReadProperties(const CLayoutPlacement &placement, const CWyraV
     const CDrawMeasure measure;
     field->SetFont(FontNumber());
     fieldWidth = fieldWidthOf(properties, FontNumber(), measure);
-    const std::int32_t own = measure.Measure(localised(Text()), FontNumber()).width;
+    const std::int32_t own = measure.Measure(Localize(Text()), FontNumber()).width;
     labelWidth = Text().empty() ? 0 : std::max(placement.labelWidth, own);
     SetFormat(formatOf(properties));
     const CNumberRange range = rangeOf(properties);

@@ -137,7 +137,7 @@ TEST_F(Recording, CommandsWaitForEstimations)
         Command(command);
         EXPECT_FALSE(traces.AllIdle());
     }
-    EXPECT_EQ(Sarnik::localised(Entry(both)), "Stop All Estimation");
+    EXPECT_EQ(Sarnik::Localize(Entry(both)), "Stop All Estimation");
     Command(both);
     EXPECT_TRUE(traces.AllIdle());
     EXPECT_EQ(view.stops, 1);

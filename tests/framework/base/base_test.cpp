@@ -14,28 +14,27 @@ namespace
 
 TEST(LocalisedString, ShowsTheDefaultAndFillsPlaces)
 {
-    EXPECT_EQ(localised("$$$/A/B=Some = text"), "Some = text");
-    EXPECT_EQ(localised("$$$/A/B"), "");
-    EXPECT_EQ(localised("plain = text"), "plain = text");
-    EXPECT_EQ(localised("$$$/K=^1 of ^0, ^0, ^2, ^", {"ten", "^0"}), "^0 of ten, ten, ^2, ^");
+    EXPECT_EQ(Localize("$$$/A/B=Some = text"), "Some = text");
+    EXPECT_EQ(Localize("$$$/A/B"), "");
+    EXPECT_EQ(Localize("plain = text"), "plain = text");
+    EXPECT_EQ(Localize("$$$/K=^1 of ^0, ^0, ^2, ^", {"ten", "^0"}), "^0 of ten, ten, ^2, ^");
 }
 
 TEST(LocalisedString, SequencesStandForCharacters)
 {
-    EXPECT_EQ(localised("$$$/K=^[a^]^{b^}^N^n^t^^0^Q^V^P^p^o"), "\u201Ca\u201D\u2018b\u2019\r\n\n\t^0?|Altaltcontrol");
-    EXPECT_EQ(localised("$$$/K=^+20AC^+20ac^+d83D^+De00"), "\u20AC\u20AC\U0001F600");
-    EXPECT_EQ(localised("$$$/K=^+D83D ^+DE00 ^+20A ^z ^Z^"), "\uFFFD \uFFFD ^+20A ^z ^Z^")
-        << "halves, and what is none";
-    EXPECT_EQ(localised("$$$Loose=^C"), "\u00A9");
-    EXPECT_EQ(localised("^C"), "^C") << "no key";
-    EXPECT_EQ(localised("$$$/K=^^0 ^0", {"^n"}), "^0 ^n");
-    std::string text = localised("$$$/K=^0 and ^1, ^0^");
+    EXPECT_EQ(Localize("$$$/K=^[a^]^{b^}^N^n^t^^0^Q^V^P^p^o"), "\u201Ca\u201D\u2018b\u2019\r\n\n\t^0?|Altaltcontrol");
+    EXPECT_EQ(Localize("$$$/K=^+20AC^+20ac^+d83D^+De00"), "\u20AC\u20AC\U0001F600");
+    EXPECT_EQ(Localize("$$$/K=^+D83D ^+DE00 ^+20A ^z ^Z^"), "\uFFFD \uFFFD ^+20A ^z ^Z^") << "halves, and what is none";
+    EXPECT_EQ(Localize("$$$Loose=^C"), "\u00A9");
+    EXPECT_EQ(Localize("^C"), "^C") << "no key";
+    EXPECT_EQ(Localize("$$$/K=^^0 ^0", {"^n"}), "^0 ^n");
+    std::string text = Localize("$$$/K=^0 and ^1, ^0^");
     ReplaceParam(text, 0, "^1x");
     EXPECT_EQ(text, "^1x and ^1, ^1x^");
     CStringTable::Global().Set("$$$/K", "^B eigen ^0");
-    EXPECT_EQ(localised("$$$/K=own ^0", {"x"}), "\u2022 eigen x");
+    EXPECT_EQ(Localize("$$$/K=own ^0", {"x"}), "\u2022 eigen x");
     CStringTable::Global().Clear();
-    EXPECT_EQ(localised("$$$/K=own ^0", {"x"}), "own x");
+    EXPECT_EQ(Localize("$$$/K=own ^0", {"x"}), "own x");
 }
 
 TEST(Exceptions, TellTheirOwnWords)
