@@ -34,7 +34,7 @@ struct openDialog
 {
     explicit openDialog(double scale) : display(scale)
     {
-        dialog.Load("PDialog.wyra");
+        dialog.LoadLayout("PDialog.wyra");
         dialog.Open();
         application.ProcessAll();
         shown = display.find(dialog.Screen()->id());

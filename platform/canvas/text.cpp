@@ -16,6 +16,38 @@ double units(int pango)
     return static_cast<double>(pango) / PANGO_SCALE;
 }
 
+/// A character's box where no font can be loaded at all, in parts of the em.
+constexpr double boxWidth = 0.6, boxAscent = 0.93, boxDescent = 0.24;
+
+PangoAttribute *boxes(double size)
+{
+    const auto whole = [&](double part) { return static_cast<int>(part * size * PANGO_SCALE); };
+    const PangoRectangle box{0, -whole(boxAscent), whole(boxWidth), whole(boxAscent + boxDescent)};
+    return pango_attr_shape_new(&box, &box);
+}
+
+/// A frame, as the library draws for letters that none of its fonts has.
+void drawBox(cairo_t *cairo, PangoAttrShape *box, gboolean, void *)
+{
+    double x = 0, y = 0;
+    cairo_get_current_point(cairo, &x, &y);
+    const double width = units(box->logical_rect.width), top = units(box->logical_rect.y);
+    cairo_rectangle(cairo, x + 0.15 * width, y + 0.8 * top, 0.7 * width, -0.8 * top);
+    cairo_set_line_width(cairo, 0.1 * width);
+    cairo_stroke(cairo);
+}
+
+/// Without a font the library (1.50) leaves the offsets of its runs unset, and adds them to all that it measures.
+void clearOffsets(PangoLayout *pango)
+{
+    for (const GSList *line = pango_layout_get_lines(pango); line != nullptr; line = line->next)
+        for (const GSList *run = static_cast<PangoLayoutLine *>(line->data)->runs; run != nullptr; run = run->next)
+        {
+            auto *const item = static_cast<PangoGlyphItem *>(run->data);
+            item->y_offset = item->start_x_offset = item->end_x_offset = 0;
+        }
+}
+
 /// One per thread. Measures must not depend on the scale or on the user's rendering settings: no hinting.
 PangoContext *textContext()
 {
@@ -30,6 +62,7 @@ PangoContext *textContext()
             pango_cairo_context_set_font_options(context, options);
             cairo_font_options_destroy(options);
             pango_context_set_round_glyph_positions(context, FALSE);
+            pango_cairo_context_set_shape_renderer(context, drawBox, nullptr, nullptr);
         }
         ~holder() { g_object_unref(context); }
         PangoContext *context;
@@ -88,6 +121,7 @@ textBlock::layout::layout(std::string_view utf8, const font &f, const textOption
     pango_font_description_set_weight(face, f.bold ? PANGO_WEIGHT_BOLD : PANGO_WEIGHT_NORMAL);
     pango_font_description_set_style(face, f.italic ? PANGO_STYLE_ITALIC : PANGO_STYLE_NORMAL);
     pango_layout_set_font_description(pango, face);
+    PangoFont *const loaded = pango_context_load_font(textContext(), face);
     pango_font_description_free(face);
 
     pango_layout_set_single_paragraph_mode(pango, !options.lines);
@@ -103,18 +137,25 @@ textBlock::layout::layout(std::string_view utf8, const font &f, const textOption
     pango_layout_set_alignment(pango, alignment(options.align));
     pango_layout_set_text(pango, text.data(), static_cast<int>(text.size()));
 
+    PangoAttrList *const attributes = pango_attr_list_new();
+    if (loaded == nullptr)
+        pango_attr_list_insert(attributes, boxes(size));
     if (options.underlined >= 0 && static_cast<std::size_t>(options.underlined) < text.size())
     {
-        PangoAttrList *list = pango_attr_list_new();
         PangoAttribute *line = pango_attr_underline_new(PANGO_UNDERLINE_SINGLE);
         line->start_index = static_cast<guint>(options.underlined);
         line->end_index = static_cast<guint>(
             static_cast<std::size_t>(options.underlined) +
             std::max<std::size_t>(1, characterLength(std::string_view(text).substr(std::size_t(options.underlined)))));
-        pango_attr_list_insert(list, line);
-        pango_layout_set_attributes(pango, list);
-        pango_attr_list_unref(list);
+        pango_attr_list_insert(attributes, line);
     }
+    pango_layout_set_attributes(pango, attributes);
+    pango_attr_list_unref(attributes);
+
+    if (loaded == nullptr)
+        clearOffsets(pango);
+    else
+        g_object_unref(loaded);
 }
 
 textBlock::layout::~layout()

@@ -3,7 +3,10 @@
 
 #include <gmock/gmock.h>
 
+#include <algorithm>
 #include <chrono>
+#include <filesystem>
+#include <fstream>
 #include <random>
 
 using namespace Platform;
@@ -125,15 +128,26 @@ TEST(utf8, AnyBytesBecomeCharacters)
 TEST(text, ABrokenFontSetupCostsTheLettersOnly)
 {
     testing::FLAGS_gtest_death_test_style = "threadsafe";
-    const auto draw = [] {
-        setenv("FONTCONFIG_FILE", "/dev/null", 1);
+    const auto draw = [](const char *fonts) {
+        std::ofstream(fonts) << "<fontconfig/>";
+        setenv("FONTCONFIG_FILE", fonts, 1);
         setenv("FONTCONFIG_PATH", "/nonexistent", 1);
-        const textBlock text("Some letters", {}, {.width = 50, .lines = true});
-        raster picture(100, 50);
-        canvas(picture).drawText(text, {1, 1}, {255, 255, 255});
-        return text.height() >= 0 && text.offsetAt({3, 3}) <= 12 ? 0 : 1;
+        const textBlock line("Some letters");
+        raster picture(120, 50);
+        canvas(picture).drawText(line, {1, 1}, {255, 255, 255});
+        const std::uint32_t *const row = picture.row(8);
+        const bool drawn = std::any_of(row, row + picture.width(), [](std::uint32_t p) { return p != 0; });
+        const double em = font{}.size;
+        return drawn && line.width() > 4 * em && line.width() < 12 * em && line.height() > em &&
+                       line.height() < 2 * em && line.baseline() < line.height() && line.caret(4).height() > em &&
+                       line.offsetAt({3, 3}) == 0
+                   ? 0
+                   : 1;
     };
-    EXPECT_EXIT(std::exit(draw()), testing::ExitedWithCode(0), "");
+    const std::string fonts = testing::TempDir() + "stillmark_no_fonts.conf";
+    EXPECT_EXIT(std::exit(draw(fonts.c_str())), testing::ExitedWithCode(0), "");
+    EXPECT_EXIT(std::exit(draw("/nonexistent/fonts.conf")), testing::ExitedWithCode(0), "");
+    std::filesystem::remove(fonts);
 }
 
 TEST(text, AnyBytesAndAnyLengthAreLaidOut)
