@@ -23,6 +23,7 @@ namespace
 using errorHandler = int (*)(Display *);
 using exitHandler = void (*)(Display *, void *);
 using requestHandler = int (*)(Display *, XErrorEvent *);
+using eventReader = Bool (*)(Display *, XEvent *, xEvent *);
 
 Display *watched = nullptr;
 void *library = nullptr;
@@ -54,6 +55,13 @@ int requestFailed(Display *which, XErrorEvent *error)
     const bool late = error->error_code == BadWindow || error->error_code == BadDrawable ||
                       (error->error_code == BadMatch && error->request_code == X_SetInputFocus);
     return late || requestBefore == nullptr ? 0 : requestBefore(which, error);
+}
+
+/// Events of changed properties are dropped. SDL asks the server for the names of some, and crashes when the connection
+/// ends before the answer; all that it learns from them is which windows are maximised, which nobody here asks.
+Bool dropEvent(Display *, XEvent *, xEvent *)
+{
+    return False;
 }
 
 /// Puts back the handler from before ours, unless somebody else's came after it.
@@ -94,11 +102,13 @@ void watchConnection(SDL_Window *window, std::atomic<bool> &lost)
         return;
     const auto setExit = libraryFunction<void (*)(Display *, exitHandler, void *)>("XSetIOErrorExitHandler");
     const auto setError = libraryFunction<errorHandler (*)(errorHandler)>("XSetIOErrorHandler");
-    if (setExit == nullptr || setError == nullptr)
+    const auto setReader = libraryFunction<eventReader (*)(Display *, int, eventReader)>("XESetWireToEvent");
+    if (setExit == nullptr || setError == nullptr || setReader == nullptr)
         return;
     watched = info.info.x11.display;
     toldOfLoss = &lost;
     setExit(watched, connectionEnded, nullptr);
+    setReader(watched, PropertyNotify, dropEvent);
     before = setError(connectionFailed);
 }
 
