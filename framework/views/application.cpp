@@ -164,23 +164,33 @@ bool CApplication::ProcessOne(double mostWait)
     const nesting nested(depth);
     bool any = CloseLate();
     Guarded([&] { any = CNotifications::Deliver() || any; });
+    const bool due = CTimer::NextDue() <= display.now();
     Guarded([&] { CTimer::FireDue(display.now()); });
+    settled = settled && !any && !due;
 
     Platform::event e;
     bool came = display.next(e, 0);
     if (!came)
     {
         bool more = PaintAll();
-        if (!more)
+        if (!more && !settled)
             Guarded([&] { more = CIdler::RunAll(); });
         if (more || any)
+        {
+            settled = false;
             return true;
-        // What a callback marked or posted meanwhile must not wait.
+        }
+        // What a callback or an idler marked or posted meanwhile must not wait, nor a loop that it has ended.
+        if (!std::exchange(settled, true))
+            return false;
         const double untilTimer = std::max(0.0, CTimer::NextDue() - display.now());
         came = display.next(e, std::min(mostWait, untilTimer));
     }
     if (came)
+    {
         Guarded([&] { Handle(e); });
+        settled = false;
+    }
     CheckDisplay();
 
     for (CWindow *w = windows.Head(); came && w != nullptr; w = w->Next())
@@ -197,12 +207,13 @@ void CApplication::ProcessAll()
     while (ProcessOne(0))
     {
     }
+    settled = false; // there may be other idlers by the next turn
 }
 
 /// What was to be closed while a tracker ran.
 bool CApplication::CloseLate()
 {
-    if (closing.empty() || CTracker::Current() != nullptr)
+    if (closing.empty() || CTracker::AnyHeld())
         return false;
     for (const Platform::event &e : std::exchange(closing, {}))
         Guarded([&] { Handle(e); });

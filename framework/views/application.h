@@ -35,7 +35,8 @@ public:
 
     /// One turn of the loop: what was posted, timers that are due, and then one event; where there is none, painting;
     /// where nothing is to be painted, idlers; where they have nothing to do, waiting, at most so long. Throws CError
-    /// where the display is lost. Whether anything happened.
+    /// where the display is lost. A turn in which timers or idlers have worked does not wait, as they may have ended
+    /// what the turns are made for. Whether anything happened.
     bool ProcessOne(double mostWait = std::numeric_limits<double>::infinity());
     /// Turns until no event is left, nothing is marked and no idler wants more.
     void ProcessAll();
@@ -102,6 +103,7 @@ private:
     CWindow *keyboardPopup = nullptr; ///< a popup that the keyboard was given to
     CTimer losing;                    ///< the keyboard has left a window, perhaps for its popup
     bool swallowText = false;         ///< the key that writes it was used for something else
+    bool settled = false;             ///< the last turn has found nothing to do
     int depth = 0;                    ///< of loops within handlers
 };
 

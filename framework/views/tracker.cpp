@@ -5,13 +5,14 @@
 #include "framework/views/window.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace Sarnik
 {
 namespace
 {
 
-CTracker *current = nullptr;
+CTracker *innermost = nullptr;
 
 } // namespace
 
@@ -22,29 +23,38 @@ CTracker::CTracker(CView &inView, std::uint32_t withOptions)
 
 CTracker::~CTracker()
 {
-    if (current == this)
-        current = nullptr;
+    if (innermost == this)
+        innermost = outer;
 }
 
 CTracker *CTracker::Current() noexcept
 {
-    return current;
+    return innermost != nullptr && innermost->Running() ? innermost : nullptr;
+}
+
+bool CTracker::AnyHeld() noexcept
+{
+    return innermost != nullptr;
 }
 
 void CTracker::ViewGone(const CView &gone) noexcept
 {
-    if (current == nullptr || current->trackedView == nullptr || !current->trackedView->IsWithin(gone))
-        return;
-    current->Abort();
-    current->trackedView = nullptr;
+    for (CTracker *t = innermost; t != nullptr; t = t->outer)
+        if (t->trackedView != nullptr && t->trackedView->IsWithin(gone))
+        {
+            t->Abort();
+            t->trackedView = nullptr;
+        }
 }
 
 void CTracker::WindowGone(const CWindow &gone) noexcept
 {
-    if (current == nullptr || current->trackedWindow != &gone)
-        return;
-    current->Abort();
-    current->trackedWindow = nullptr;
+    for (CTracker *t = innermost; t != nullptr; t = t->outer)
+        if (t->trackedWindow == &gone)
+        {
+            t->Abort();
+            t->trackedWindow = nullptr;
+        }
 }
 
 CPoint CTracker::InView(CPoint inWindow) const
@@ -63,7 +73,7 @@ CPoint CTracker::InView(CPoint inWindow) const
 
 bool CTracker::Run(const CMouseEvent &event)
 {
-    if (current != nullptr || trackedWindow == nullptr || trackedView == nullptr)
+    if (Current() != nullptr || trackedWindow == nullptr || trackedView == nullptr)
         return false;
 
     /// Whatever way the loop is left.
@@ -71,14 +81,15 @@ bool CTracker::Run(const CMouseEvent &event)
     {
         explicit capture(CTracker &t) : tracker(t)
         {
-            current = &tracker;
+            tracker.outer = std::exchange(innermost, &tracker);
             tracker.trackedWindow->SetTracking(&tracker);
         }
         ~capture()
         {
+            tracker.state &= ~std::uint32_t{running};
             if (tracker.trackedWindow != nullptr)
                 tracker.trackedWindow->SetTracking(nullptr);
-            current = nullptr;
+            innermost = tracker.outer;
         }
         CTracker &tracker;
     };
@@ -92,7 +103,7 @@ bool CTracker::Run(const CMouseEvent &event)
     startTime = endTime = CApplication::Now();
     if (!Begin())
     {
-        state = ended;
+        state = (state & aborted) | ended;
         return false;
     }
 
@@ -127,13 +138,13 @@ void CTracker::KeyDown(CKeyboardMessage &message)
 
 void CTracker::Mouse(const CMouseEvent &event, bool release)
 {
-    if (!Running() || (release && event.button != button))
+    if (!Running())
         return;
     modifiers = event.modifiers;
     currentInWindow = event.inWindow;
     currentPoint = InView(event.inWindow);
     Track();
-    if (release)
+    if (release && event.button == button)
         state &= ~running;
 }
 

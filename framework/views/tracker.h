@@ -14,7 +14,8 @@ class CWindow;
 
 /// A drag: a loop of its own from a press to the release of the button, while timers, idlers and painting go on. Made
 /// on the stack by the view's MouseDown. It ends aborted where somebody calls Abort, the view or its window goes, the
-/// window is to be closed or loses the keyboard; where the display is lost, Run throws after the end.
+/// window is to be closed or loses the keyboard, or a modal window opens, before which it cannot return; where the
+/// display is lost, Run throws after the end.
 class CTracker
 {
 public:
@@ -35,8 +36,10 @@ public:
     bool Aborted() const { return (state & aborted) != 0; }
     bool Running() const { return (state & running) != 0; }
 
-    /// The one that runs; null for none.
+    /// The one that runs; null for none, and for one that has ended: what its End opens gets the input.
     static CTracker *Current() noexcept;
+    /// Whether one has not come back from Run yet, running or ended.
+    static bool AnyHeld() noexcept;
     /// A view is about to go.
     static void ViewGone(const CView &gone) noexcept;
     static void WindowGone(const CWindow &gone) noexcept;
@@ -48,7 +51,7 @@ public:
 protected:
     /// Whether to go on.
     virtual bool Begin() { return true; }
-    /// For every move, and for the release.
+    /// For whatever the pointer does; for the release, too.
     virtual void Track() {}
     /// A key goes down; Escape aborts.
     virtual void KeyDown(CKeyboardMessage &message);
@@ -77,6 +80,7 @@ private:
 
     CView *trackedView;
     CWindow *trackedWindow;
+    CTracker *outer = nullptr; ///< one that has ended, in whose End this one runs
     std::uint32_t trackerOptions;
     std::uint32_t state = 0;
     int button = 1;

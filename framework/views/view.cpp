@@ -161,6 +161,12 @@ bool CView::SetFocus()
     return window != nullptr && window->SetFocus(this);
 }
 
+bool CView::HasPress() const
+{
+    const CWindow *const window = Window();
+    return window != nullptr && window->Pressed() == this;
+}
+
 void CView::Invalidate()
 {
     Invalidate(Bounds());

@@ -97,6 +97,9 @@ public:
     // takes goes on to the parent view.
     virtual bool MouseDown(const CMouseEvent &) { return false; }
     virtual void MouseUp(const CMouseEvent &) {}
+    /// Whether it has taken a press that goes on. One ends without a release where a modal window opens, or the view is
+    /// hidden or disabled.
+    bool HasPress() const;
     /// While the pointer is over it, or since it took a press.
     virtual void MouseMove(const CMouseEvent &) {}
     virtual void MouseEnter() {}

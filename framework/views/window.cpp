@@ -212,9 +212,12 @@ CObjID CWindow::RunModal(CWindow *by)
 
     Restart();
     modalResult = {};
-    // The release of a button that is down will not come to where it was pressed.
+    // The release of a button that is down will not come to where it was pressed, and a tracker would keep its input
+    // from the modal window.
+    if (CTracker *const running = CTracker::Current())
+        running->Abort();
     for (CWindow *w = application.windows.Head(); w != nullptr; w = w->Next())
-        w->pressed = nullptr;
+        w->EndPress();
     application.DismissPopups();
     Open(by);
     const modality held(application, *this);
@@ -244,6 +247,14 @@ void CWindow::SetTracking(CTracker *by)
     tips.Hide();
 }
 
+/// The pointer is no longer kept for a view, or for a tracker that has ended.
+void CWindow::EndPress()
+{
+    pressed = nullptr;
+    if (IsOpen() && (tracker == nullptr || !tracker->Running()))
+        screen->capturePointer(false);
+}
+
 CView *CWindow::ViewAt(CPoint p) const
 {
     if (!toCanvas(Bounds()).contains(p))
@@ -269,8 +280,10 @@ void CWindow::Forget(CView &view)
         if (CContext *const above = view.Container())
             above->SetTarget(nullptr);
     }
-    for (CView **const kept : {&hovered, &pressed, &defaultView, &cancelView, &menuView})
+    for (CView **const kept : {&hovered, &defaultView, &cancelView, &menuView})
         drop(*kept);
+    if (pressed != nullptr && pressed->IsWithin(view))
+        EndPress();
     if (drag != nullptr)
         drag->Forget(view);
 }
@@ -280,7 +293,7 @@ void CWindow::ViewStateChanged(CView &view)
     if (focus != nullptr && focus->IsWithin(view) && !focus->CanFocus())
         SetFocus(nullptr);
     if (pressed != nullptr && pressed->IsWithin(view) && !(pressed->IsVisible() && pressed->IsEnabled()))
-        pressed = nullptr;
+        EndPress();
 }
 
 } // namespace Sarnik

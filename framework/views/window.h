@@ -104,6 +104,8 @@ public:
     /// The one that F10 presses: a menu bar. Null for none.
     void SetMenuView(CView *view) { menuView = view; }
     CView *Hovered() const { return hovered; }
+    /// The view that a press goes on in; null for none, and while a tracker runs of no meaning.
+    CView *Pressed() const { return pressed; }
     /// A subtree is about to go, or to leave.
     void Forget(CView &view);
     void ViewStateChanged(CView &view);
@@ -161,6 +163,7 @@ private:
     void HandleWheel(CMouseEvent &e);
     void HandleDrop(const Platform::event &e);
     void HandleResize();
+    void EndPress();
     void Hover(CView *view, const CMouseEvent &e);
     void UpdateCursor();
     bool PressAccessKey(char32_t character);

@@ -52,7 +52,7 @@ void CWindow::HandlePointer(const Platform::event &e)
     pointerModifiers = e.modifiers;
     if (tracker != nullptr)
     {
-        if (e.kind == eventKind::pointerMove || e.kind == eventKind::pointerUp)
+        if (pointerInside)
             tracker->Mouse(mouse, e.kind == eventKind::pointerUp);
         return;
     }
@@ -74,9 +74,7 @@ void CWindow::HandlePointer(const Platform::event &e)
     case eventKind::pointerUp:
         if (CView *const released = pressed; released != nullptr && e.button == 1)
         {
-            pressed = nullptr;
-            if (IsOpen())
-                screen->capturePointer(false);
+            EndPress();
             released->MouseUp(mouse.For(*released));
         }
         break;

@@ -164,7 +164,6 @@ bool CMenuBarPane::MouseDown(const CMouseEvent &e)
     const std::size_t at = TitleAt(e.at);
     if (at == none)
         return false;
-    pressing = true;
     OpenMenu(at, false);
     return true;
 }
@@ -173,15 +172,14 @@ void CMenuBarPane::MouseMove(const CMouseEvent &e)
 {
     const std::size_t at = TitleAt(e.at);
     Heat(at);
-    if (at != none && (pressing || IsOpen()))
+    if (at != none && (HasPress() || IsOpen()))
         OpenMenu(at, false);
-    if (pressing && IsOpen())
+    if (HasPress() && IsOpen())
         popup->DragTo(OnScreen(e.at));
 }
 
 void CMenuBarPane::MouseUp(const CMouseEvent &e)
 {
-    pressing = false;
     // A release over a title leaves its menu open: a click has opened it.
     if (!IsOpen() || TitleAt(e.at) != none)
         return;

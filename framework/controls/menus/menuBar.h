@@ -86,7 +86,6 @@ private:
     std::vector<title> titles;
     std::vector<CObjID> commands; ///< of the open menu
     std::size_t opened = none, hot = none;
-    bool pressing = false;
     std::int32_t menuFont = kFont_UIMedium;
     std::unique_ptr<CMenuWindow> popup;
 };

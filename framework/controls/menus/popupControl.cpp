@@ -45,20 +45,18 @@ bool CPopupControl::MouseDown(const CMouseEvent &e)
 {
     if (!OpensAt(e.at))
         return false;
-    pressing = true;
     OpenPopup(false);
     return true;
 }
 
 void CPopupControl::MouseMove(const CMouseEvent &e)
 {
-    if (pressing && IsOpen())
+    if (HasPress() && IsOpen())
         popup->DragTo(OnScreen(e.at));
 }
 
 void CPopupControl::MouseUp(const CMouseEvent &e)
 {
-    pressing = false;
     if (!IsOpen())
         return;
     // A release over the control leaves the menu open: a click has opened it.

@@ -55,7 +55,6 @@ private:
     CPoint OnScreen(CPoint p) const { return Window()->ToScreen(ToWindow(p)); }
 
     std::unique_ptr<CMenuWindow> popup;
-    bool pressing = false;
 };
 
 } // namespace Sarnik

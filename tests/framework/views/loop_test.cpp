@@ -84,7 +84,8 @@ TEST_F(loop, TrackersFollowTheDragAndEndForManyReasons)
         0.5,
         [](void *w) {
             auto &self = *static_cast<CWindow *>(w);
-            self.Remove(*self.FindView("test/pane/pane"));
+            if (CView *const view = self.FindView("test/pane/pane"))
+                self.Remove(*view);
         },
         &window);
     begin().after(1).move(25, 25).release(25, 25);
@@ -113,6 +114,68 @@ TEST_F(loop, AWindowClosesAfterItsTracker)
     display.to(*doomed->Screen()).move(15, 15).press(15, 15).after(1).move(25, 25).release(25, 25);
     killer.Start();
     EXPECT_THAT(Told(), testing::Contains("aborted"));
+}
+
+/// Opens a modal window that the user closes after a second.
+struct asker
+{
+    void Ask()
+    {
+        later.Stop();
+        CWindow alert;
+        alert.Open();
+        on.to(*alert.Screen()).after(1).close();
+        CTimer never(
+            5, [](void *w) { static_cast<CWindow *>(w)->EndModal("test/never"); }, &alert);
+        never.Start();
+        log.push_back(alert.RunModal() ? "stuck" : "closed");
+    }
+    Platform::memoryDisplay &on;
+    Log &log;
+    CTimer later{0.5, [](void *self) { static_cast<asker *>(self)->Ask(); }, this};
+};
+
+struct askingPane : notingPane
+{
+    struct tracker : CTracker
+    {
+        tracker(CView &view, asker &a) : CTracker(view), asks(a) {}
+        void End(bool wasAborted) override
+        {
+            if (!wasAborted)
+                asks.Ask();
+        }
+        asker &asks;
+    };
+
+    using notingPane::notingPane;
+    bool MouseDown(const CMouseEvent &e) override
+    {
+        Note(tracker(*this, *asks).Run(e) ? "ended" : "aborted");
+        return true;
+    }
+    asker *asks = nullptr;
+};
+
+TEST_F(loop, ModalWindowsGetTheInputThatADragHad)
+{
+    asker asks{display, log};
+    window.Make<askingPane>(log, "drags", CRect{10, 10, 60, 40}).asks = &asks;
+    Pane("pressed", {70, 10, 120, 40});
+    display.drag({{15, 15}, {20, 20}});
+    EXPECT_THAT(Told(), ElementsAre("drags enter", "closed", "drags ended"));
+
+    // In the middle of a drag, and of a press: they get no release, and keep no pointer.
+    for (const auto &[x, told] : {std::pair{15.0, Log{"closed", "drags aborted"}},
+                                  std::pair{75.0, Log{"drags leave", "pressed enter", "pressed down 5,5", "closed"}}})
+    {
+        display.to(*window.Screen()).move(x, 15).press(x, 15);
+        asks.later.Start();
+        while (asks.later.IsRunning() || !display.scriptEnded())
+            application.ProcessOne();
+        EXPECT_EQ(Told(), told);
+        EXPECT_FALSE(Screen().hasPointer());
+    }
 }
 
 TEST_F(loop, TheLostDisplayEndsEveryLoopWithAnError)
@@ -166,6 +229,31 @@ TEST_F(loop, ModalWindowsKeepInputFromOthersButNotFromTheirOwn)
     EXPECT_EQ(dialog.RunModal(), CObjID());
     close.Stop();
     end.Stop();
+}
+
+TEST_F(loop, NobodyWaitsWhoseLoopHasEnded)
+{
+    static CObjID by; // who ends the modal window: a timer, or an idler that has no more to do
+    const auto end = [](void *) { CApplication::Current()->Modal()->EndModal(by); };
+    struct ender : CIdler
+    {
+        bool Idle() override
+        {
+            if (by == CObjID("test/idler"))
+                CApplication::Current()->Modal()->EndModal(by);
+            return false;
+        }
+    } idler;
+    CTimer timer(1, end, nullptr);
+    timer.Start();
+    for (const char *const ending : {"test/timer", "test/idler"})
+    {
+        CWindow dialog;
+        const double from = display.now();
+        by = ending;
+        EXPECT_EQ(dialog.RunModal(), by);
+        EXPECT_LT(display.now(), from + (by == CObjID("test/idler") ? 0.5 : 1.5));
+    }
 }
 
 TEST_F(loop, NegativeCornersAreSharesOfTheRoom)
