@@ -104,9 +104,10 @@ void CView::SetState(std::uint32_t bit, bool set)
     Invalidate();
     optionBits ^= bit;
     Invalidate();
+    TellState();
+    // Last: what loses the focus may say something that deletes this view.
     if (CWindow *const window = Window())
         window->ViewStateChanged(*this);
-    TellState();
 }
 
 void CView::TellState()

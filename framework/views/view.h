@@ -70,7 +70,7 @@ public:
     /// Whether the tab key stops at it, where it can have the focus. Of a group the chosen one does.
     virtual bool IsTabStop() const { return HasOption(kView_TabStop); }
     bool HasFocus() const;
-    /// False where it cannot have it.
+    /// As CWindow::SetFocus.
     bool SetFocus();
 
     // Drawing.

@@ -290,10 +290,10 @@ void CWindow::Forget(CView &view)
 
 void CWindow::ViewStateChanged(CView &view)
 {
-    if (focus != nullptr && focus->IsWithin(view) && !focus->CanFocus())
-        SetFocus(nullptr);
     if (pressed != nullptr && pressed->IsWithin(view) && !(pressed->IsVisible() && pressed->IsEnabled()))
         EndPress();
+    if (focus != nullptr && focus->IsWithin(view) && !focus->CanFocus())
+        SetFocus(nullptr);
 }
 
 } // namespace Sarnik

@@ -90,7 +90,8 @@ public:
     /// The front-most visible view at a point; null for none.
     CView *ViewAt(CPoint p) const;
     CView *Focus() const { return focus; }
-    /// Null takes the focus from all. False where the view cannot have it.
+    /// Null takes the focus from all. False where the view cannot have it, or has gone with what the one before said
+    /// as it lost it; the window may have gone, too.
     bool SetFocus(CView *view);
     /// To the next view in tab order, or the one before, around the ends. False where there is none.
     bool MoveFocus(bool forward);

@@ -40,12 +40,14 @@ bool CWindow::SetFocus(CView *view)
     for (CView *const end : {old, view})
         for (CView *at = end; at != nullptr && at->ParentView() != nullptr; at = at->ParentView())
             at->ParentView()->FocusWithinChanged();
+    const CApplication::witness alive(*this);
     if (old != nullptr)
         old->FocusChanged(false);
-    // Whoever lost it may have given it to a third one.
-    if (focus == view && view != nullptr)
+    // Whoever lost it may have given it to a third one, or its last word has closed all.
+    const bool given = alive && focus == view;
+    if (given && view != nullptr)
         view->FocusChanged(true);
-    return true;
+    return given;
 }
 
 void CWindow::SetShowsFocus(bool shows)

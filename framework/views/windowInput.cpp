@@ -101,6 +101,7 @@ void CWindow::HandleDown(CMouseEvent &e)
                 return;
         return;
     }
+    const CApplication::witness alive(*this);
     for (CView *view = front; view != nullptr; view = view->ParentView())
         if (view->CanFocus() && !view->HasOption(kView_NoFocusOnClick))
         {
@@ -108,7 +109,8 @@ void CWindow::HandleDown(CMouseEvent &e)
             break;
         }
     // A change of the focus may have moved or removed what was there.
-    const CApplication::witness alive(*this);
+    if (!alive)
+        return;
     for (CView *view = ViewAt(e.inWindow); view != nullptr; view = view->ParentView())
     {
         // Set before: a tracker runs within, and a view that goes takes it back.

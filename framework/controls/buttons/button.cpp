@@ -74,9 +74,11 @@ void CButton::Press()
 {
     if (!IsEnabled() || !IsVisible())
         return;
+    const std::weak_ptr<const void> alive = Life();
     if (kind == kCheckButton || kind == kRadioButton)
         SetFocus();
-    Click(1);
+    if (!alive.expired())
+        Click(1);
 }
 
 bool CButton::MouseDown(const CMouseEvent &e)

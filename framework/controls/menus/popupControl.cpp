@@ -37,8 +37,10 @@ void CPopupControl::ClosePopup()
 
 void CPopupControl::Press()
 {
+    const std::weak_ptr<const void> alive = Life();
     SetFocus();
-    OpenPopup();
+    if (!alive.expired())
+        OpenPopup();
 }
 
 bool CPopupControl::MouseDown(const CMouseEvent &e)

@@ -405,23 +405,51 @@ TEST_F(loop, HandlersMayDeleteTheirWindow)
             return true;
         }
         void MouseLeave() override { victim->reset(); }
+        void FocusChanged(bool has) override
+        {
+            if (!has && diesWithoutFocus)
+                victim->reset();
+        }
         bool ReceiveKeyboard(CKeyboardMessage &) override
         {
             victim->reset();
             return true;
         }
         std::unique_ptr<notingWindow> *victim = nullptr;
+        bool diesWithoutFocus = false;
     };
-    for (int way = 0; way < 3; ++way)
+    for (int way = 0; way < 6; ++way)
     {
         auto doomed = std::make_unique<notingWindow>(log);
         auto &pane = doomed->Make<suicidal>(log, "pane", CRect{0, 0, 50, 50}, kView_Target);
+        Pane("other", {60, 0, 90, 50}, kView_Target, doomed.get());
         pane.victim = &doomed;
+        pane.diesWithoutFocus = way > 2;
         doomed->Open();
         pane.SetFocus();
         Told();
         display.to(*doomed->Screen());
-        way == 0 ? display.click(5, 5) : way == 1 ? display.move(5, 5).move(70, 70) : display.type("ab");
+        switch (way)
+        {
+        case 0:
+            display.click(5, 5);
+            break;
+        case 1:
+            display.move(5, 5).move(70, 70);
+            break;
+        case 2:
+            display.type("ab");
+            break;
+        case 3:
+            display.click(70, 5);
+            break;
+        case 4:
+            EXPECT_FALSE(doomed->FindView("test/pane/other")->SetFocus());
+            break;
+        default:
+            pane.Enable(false);
+            break;
+        }
         Told();
         EXPECT_EQ(doomed, nullptr) << way;
     }
