@@ -133,11 +133,12 @@ void CApplication::CheckDisplay() const
         throw CError("$$$/Sarnik/Application/Error/DisplayLost=The connection to the display was lost.");
 }
 
-template <class Action> void CApplication::Guarded(Action action)
+template <class Action> bool CApplication::Guarded(Action action)
 {
     try
     {
         action();
+        return true;
     }
     catch (const CException &e)
     {
@@ -145,6 +146,7 @@ template <class Action> void CApplication::Guarded(Action action)
         if (display.lost())
             throw;
         CReporter::Get()->Report(e);
+        return false;
     }
 }
 
@@ -163,7 +165,8 @@ bool CApplication::ProcessOne(double mostWait)
         leaving.clear();
     const nesting nested(depth);
     bool any = CloseLate();
-    Guarded([&] { any = CNotifications::Deliver() || any; });
+    // What waits behind one that failed comes with the next turn.
+    any = !Guarded([&] { any = CNotifications::Deliver() || any; }) || any;
     const bool due = CTimer::NextDue() <= display.now();
     Guarded([&] { CTimer::FireDue(display.now()); });
     settled = settled && !any && !due;

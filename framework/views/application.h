@@ -91,7 +91,8 @@ private:
     CWindow *WindowOf(Platform::windowId id) const;
     CWindow *PressHolder() const;
     CWindow *KeyboardWindow(CWindow *from) const;
-    template <class Action> void Guarded(Action action);
+    /// Whether it came to its end.
+    template <class Action> bool Guarded(Action action);
 
     Platform::display &display;
     CApplication *previous;
