@@ -158,9 +158,10 @@ bool CSliderBase::ReceiveKeyboard(CKeyboardMessage &message)
     if (!message.IsDown())
     {
         // Shift alone ends nothing.
+        const std::weak_ptr<const void> alive = Life();
         if (message.Key() != key::none)
             EndEdit();
-        return false;
+        return alive.expired();
     }
     const bool large = (message.Modifiers() & Platform::shiftModifier) != 0;
     const double step = large ? MajorIncrement() : MinorIncrement();

@@ -52,14 +52,19 @@ TEST_F(sliders, DragsBeginGoOnAndEnd)
     display.click(At(10), 20).wheel(At(10), 20, 1);
     EXPECT_THAT(Told(), IsEmpty());
     // Deleted by a handler.
-    for (const EValuePhase phase : {kValue_DragBegin, kValue_Drag, kValue_DragEnd})
+    for (const EValuePhase phase :
+         {kValue_DragBegin, kValue_Drag, kValue_DragEnd, kValue_EditBegin, kValue_Edit, kValue_EditEnd})
     {
         CCustomSlider *gone = &Slider();
+        gone->SetFocus();
         panel.onValue = [&](CValueMessage &m) {
             if (m.Phase() == phase && gone != nullptr)
                 panel.Remove(*std::exchange(gone, nullptr));
         };
-        display.drag({{At(50), 20}, {At(60), 20}});
+        if (phase < kValue_EditBegin)
+            display.drag({{At(50), 20}, {At(60), 20}});
+        else
+            display.tap(key::right);
         Run();
         EXPECT_EQ(gone, nullptr);
     }
