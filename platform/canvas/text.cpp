@@ -209,6 +209,12 @@ int textBlock::lineCount() const
     return pango_layout_get_line_count(made->pango);
 }
 
+std::size_t textBlock::lastLine() const
+{
+    PangoLayoutLine *const line = pango_layout_get_line_readonly(made->pango, lineCount() - 1);
+    return static_cast<std::size_t>(pango_layout_line_get_start_index(line));
+}
+
 rectangle textBlock::caret(std::size_t offset) const
 {
     PangoRectangle strong;
@@ -274,7 +280,7 @@ bool isCaretPlace(const PangoLogAttr &a)
     return a.is_cursor_position;
 }
 
-bool isWordStart(const PangoLogAttr &a)
+bool beginsWord(const PangoLogAttr &a)
 {
     return a.is_word_start;
 }
@@ -293,12 +299,20 @@ std::size_t textBlock::previousCharacter(std::size_t offset) const
 
 std::size_t textBlock::nextWord(std::size_t offset) const
 {
-    return seek(made->pango, made->text, made->index(offset), 1, isWordStart);
+    return seek(made->pango, made->text, made->index(offset), 1, beginsWord);
 }
 
 std::size_t textBlock::previousWord(std::size_t offset) const
 {
-    return seek(made->pango, made->text, made->index(offset), -1, isWordStart);
+    return seek(made->pango, made->text, made->index(offset), -1, beginsWord);
+}
+
+bool textBlock::isWordStart(std::size_t offset) const
+{
+    int count = 0;
+    const PangoLogAttr *const attributes = pango_layout_get_log_attrs_readonly(made->pango, &count);
+    const char *const begin = made->text.c_str();
+    return beginsWord(attributes[g_utf8_pointer_to_offset(begin, begin + made->index(offset))]);
 }
 
 } // namespace Platform

@@ -43,6 +43,8 @@ struct textOptions
     textAlign align = textAlign::left;
     textTrim trim = textTrim::none;
     std::ptrdiff_t underlined = -1; ///< byte offset of one character to underline; -1 none
+
+    friend bool operator==(const textOptions &, const textOptions &) = default;
 };
 
 /// A text laid out, ready to be drawn. Measures do not depend on the scale that it is drawn at. Offsets are in bytes of
@@ -66,6 +68,8 @@ public:
     /// From the top of the first line down to its base line.
     double baseline() const;
     int lineCount() const;
+    /// Where the last line begins.
+    std::size_t lastLine() const;
 
     /// Where the caret stands before the character at the offset: a rectangle of no width. Offsets past the end are the
     /// end's.
@@ -80,6 +84,7 @@ public:
     std::size_t previousCharacter(std::size_t offset) const;
     std::size_t nextWord(std::size_t offset) const;
     std::size_t previousWord(std::size_t offset) const;
+    bool isWordStart(std::size_t offset) const;
 
 private:
     friend class canvas;

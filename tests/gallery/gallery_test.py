@@ -19,6 +19,8 @@ STOPS = ["gallery/" + name for name in (
     "alert/error start name password notes size/Field strength/Field angle angleNumber level levelNumber context "
     "noise paper zoom actions flyout page first disclose cells files cancel ok").split()]
 
+NOTES = r"Several lines, scrolled\nas far as needed,\nby wheel, bar and caret.\n\nThe end."
+
 # With the focus on a control: keys, and what they lead to. Every part ends as it began, or goes on with the next one.
 # Keys within a tuple open or close a window.
 BY_KEYS = [
@@ -54,9 +56,8 @@ BY_KEYS = [
      ['value password editBegin "secret"', 'value password edit "secretA"', 'value password edit "secretAx"',
       'value password editEnd "secret"']),
     ("notes", ["ctrl+a", "x", "Return", "y", "Escape"],
-     ['value notes editBegin "Several lines,\\nscrolled as far as needed."', 'value notes edit "x"',
-      'value notes edit "x\\n"', 'value notes edit "x\\ny"',
-      'value notes editEnd "Several lines,\\nscrolled as far as needed."']),
+     [f'value notes editBegin "{NOTES}"', 'value notes edit "x"', 'value notes edit "x\\n"',
+      'value notes edit "x\\ny"', f'value notes editEnd "{NOTES}"']),
     ("size/Field", ["Up"], ["value size editBegin 40", "value size edit 41", "value size editEnd 41"]),
     ("size/Field", ["Prior"], ["value size editBegin 41", "value size edit 51", "value size editEnd 51"]),
     ("size/Field", ["ctrl+a", "7", "Return"], ["value size editBegin 51", "value size edit 7", "value size editEnd 7"]),
@@ -209,13 +210,13 @@ class OnScreen(unittest.TestCase):
         g.pull("gallery/name", (0.99, 0.5), (0, 0.5))
         g.keys("x")
         tells('value name edit "x"')
-        g.click("gallery/notes", x=0.95, y=0.9)
+        g.pull("gallery/notes", (0.97, 0.4), (0.97, 1.2))  # its scroll bar
         tells('value name editEnd "x"')
+        g.click("gallery/notes", x=0.8, y=0.9)
         g.type("!")
-        tells(*(f'value notes {phase} "Several lines,\\nscrolled as far as needed.{more}"'
-                for phase, more in (("editBegin", ""), ("edit", "!"))))
+        tells(f'value notes editBegin "{NOTES}"', f'value notes edit "{NOTES}!"')
         g.click("gallery/password")
-        tells('value notes editEnd "Several lines,\\nscrolled as far as needed.!"')
+        tells(f'value notes editEnd "{NOTES}!"')
         pulls("size/Slider", "size", (0.3, 0.5), (1, 0.5), 499, 499)
         pulls("strength/Slider", "strength", (0.3, 0.5), (0, 0.5), 0, 0)
         pulls("angle", "angle", (0.9, 0.5), (0.5, 0), 80, 100)

@@ -37,10 +37,16 @@ void CEditString::SetValue(std::string_view utf8)
 void CEditString::ReplaceText(std::string_view utf8)
 {
     editor.SetText(utf8);
-    // From the beginning, where the focus is elsewhere.
     scroll = {};
     if (HasFocus())
         Reveal();
+    else
+    {
+        // From the beginning.
+        if (SeveralLines())
+            editor.Select(0, 0);
+        ScrollTo({});
+    }
     Grow();
     Invalidate();
 }
@@ -55,6 +61,7 @@ void CEditString::SetMaxCharacters(std::size_t most)
 {
     maxCharacters = most;
     editor.SetRules(SeveralLines(), most);
+    ScrollTo(scroll);
     Invalidate();
 }
 
@@ -95,7 +102,8 @@ CLayoutSize CEditString::NaturalSize(const CWyraVariablePropertyList &properties
     const bool several = (ReadFlags(properties, "text_options") & kEdit_MultiLine) != 0;
     const std::int32_t lines = several ? std::clamp(properties.Integer("text_lines", 3), 1, 1000) : 1;
     const std::int32_t width = std::clamp(properties.Integer("text_width", characters * line.width), 1, 10000);
-    return {width + edges, std::max(naturalHeight, line.height * lines + 2 * CDrawTools::ringRoom + 4)};
+    return {width + edges + (several ? BarThickness() : 0),
+            std::max(naturalHeight, line.height * lines + 2 * CDrawTools::ringRoom + 4)};
 }
 
 // Places.
@@ -116,10 +124,12 @@ const CTextLines &CEditString::Lines() const
 Platform::rectangle CEditString::TextRoom() const
 {
     const Platform::rectangle all = Room();
-    if (Has(kEdit_NoFrame))
-        return all;
-    const double x = CDrawTools::ringRoom + insetX, y = CDrawTools::ringRoom + (SeveralLines() ? insetY : 1);
-    return {all.left + x, all.top + y, all.right - x, all.bottom - y};
+    const bool framed = !Has(kEdit_NoFrame), several = SeveralLines();
+    const double x = framed ? CDrawTools::ringRoom + insetX : 0;
+    const double y = framed ? CDrawTools::ringRoom + (several ? insetY : 1) : 0;
+    // The bar's room is never the text's, so that lines do not break elsewhere as it comes and goes.
+    const double right = several ? BarEdge() + BarThickness() + 2 : x;
+    return {all.left + x, all.top + y, all.right - right, all.bottom - y};
 }
 
 CPoint CEditString::Origin() const
@@ -129,44 +139,15 @@ CPoint CEditString::Origin() const
         return {room.left, room.top - scroll.y};
     const CTextLines &lines = Lines();
     // One place right of the text is the caret's.
-    const double spare = room.width() - lines.Block().width() - 1;
+    const double spare = room.width() - lines.Width() - 1;
     const double shift = spare <= 0 ? 0 : align == kAlign_Center ? spare / 2 : align == kAlign_Far ? spare : 0;
     return {room.left + shift - scroll.x, std::round(room.top + (room.height() - lines.LineHeight()) / 2)};
-}
-
-CPoint CEditString::Largest() const
-{
-    const Platform::rectangle room = TextRoom();
-    const Platform::textBlock &block = Lines().Block();
-    if (SeveralLines())
-        return {0, std::max(0.0, block.height() - room.height())};
-    return {std::max(0.0, block.width() + 1 - room.width()), 0};
 }
 
 std::size_t CEditString::OffsetAt(CPoint at) const
 {
     const CPoint origin = Origin();
     return Lines().OffsetAt({at.x - origin.x, at.y - origin.y});
-}
-
-void CEditString::Reveal()
-{
-    const Platform::rectangle caret = Lines().Caret(editor.Caret()), room = TextRoom();
-    const CPoint most = Largest();
-    const auto moved = [](double from, double low, double high, double size, double largest) {
-        from = std::clamp(from, std::max(0.0, high - size), std::max(0.0, low));
-        return std::clamp(from, 0.0, largest);
-    };
-    const CPoint old = scroll;
-    if (SeveralLines())
-        scroll = {0, moved(scroll.y, caret.top, std::max(caret.top, caret.bottom),
-                           std::max(room.height(), caret.height()), most.y)};
-    else
-        scroll = {moved(scroll.x, caret.left, caret.left + 1, std::max(1.0, room.width()), most.x), 0};
-    if (!(old == scroll))
-        Invalidate();
-    ShowCaret();
-    Invalidate();
 }
 
 void CEditString::Grow()
@@ -182,10 +163,10 @@ void CEditString::Grow()
     if (SeveralLines())
     {
         const double line = lines.LineHeight();
-        frame.bottom = frame.top + limited(lines.Block().height(), growLines[0] * line, growLines[1] * line);
+        frame.bottom = frame.top + limited(lines.Height(), growLines[0] * line, growLines[1] * line);
     }
     else
-        frame.right = frame.left + limited(lines.Block().width() + 1, growWidth[0] - chrome, growWidth[1] - chrome);
+        frame.right = frame.left + limited(lines.Width() + 1, growWidth[0] - chrome, growWidth[1] - chrome);
     SetFrame(frame);
 }
 
@@ -211,14 +192,15 @@ void CEditString::Draw(CPort &port)
     room.right += 1; // the caret behind the last character
     canvas.save();
     canvas.clip(room);
+    const CTextPieces::span sight{room.top - origin.y, room.bottom - origin.y};
     if (HasFocus())
-        for (const Platform::rectangle &part : lines.Covered(editor.From(), editor.To()))
+        for (const Platform::rectangle &part : lines.Covered(editor.From(), editor.To(), sight))
             canvas.fillRectangle(canvas.sharp(Platform::rectangle{origin.x + part.left, origin.y + part.top,
                                                                   origin.x + part.right, origin.y + part.bottom}),
                                  colours.accent);
-    const double base = lines.Block().baseline();
+    const double base = lines.Pieces().Baseline();
     const Platform::point begin = canvas.sharp(Platform::point{origin.x, origin.y + base});
-    canvas.drawText(lines.Block(), {begin.x, begin.y - base}, Ink());
+    lines.Pieces().Draw(canvas, {begin.x, begin.y - base}, sight, Ink());
     if (caretShown)
         canvas.fillRectangle(toCanvas(CaretRect()), colours.text);
     canvas.restore();
@@ -260,7 +242,9 @@ void CEditString::FocusChanged(bool has)
     if (has)
     {
         restored = editor.Text();
-        editor.SelectAll();
+        // In several lines, what can be seen and the caret stay where they are.
+        if (!SeveralLines())
+            editor.SelectAll();
         ShowCaret();
         Invalidate();
         return;

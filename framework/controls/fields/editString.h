@@ -12,6 +12,8 @@
 namespace Sarnik
 {
 
+class CScrollBar;
+
 /// How a field behaves; values are those of kEdit_... in layouts.
 enum EEditOptions : std::uint32_t
 {
@@ -30,7 +32,7 @@ enum EEditOptions : std::uint32_t
 /// A field for text. The class "CEditString" of layouts. A change begins with the first key that changes the text and
 /// ends with Enter or the loss of the focus; Escape brings back the text from before. Each tells so by a
 /// CValMsg<std::string>. Answers the commands sarnik/command/cut, copy, paste, clear, selectAll, undo and redo while it
-/// has the focus.
+/// has the focus. Several lines that are higher than the field have a scroll bar.
 class CEditString : public CControl, protected CEditPhases
 {
 public:
@@ -56,8 +58,9 @@ public:
 
     void Draw(CPort &port) override;
     void FocusChanged(bool has) override;
-    void FrameChanged() override { Reveal(); }
+    void FrameChanged() override;
     bool ReceiveKeyboard(CKeyboardMessage &message) override;
+    bool ReceiveMessage(CMessage &message) override;
     bool ReceiveCommand(CCommandMessage &message) override;
     bool UpdateCommand(CCommandMessage &message) override;
     bool MouseDown(const CMouseEvent &e) override;
@@ -112,10 +115,19 @@ private:
     Platform::rectangle TextRoom() const;
     /// Where the text's own (0, 0) lies.
     CPoint Origin() const;
-    CPoint Largest() const;
     std::size_t OffsetAt(CPoint at) const;
-    void Reveal();
     void Grow();
+
+    // Scrolling.
+    std::int32_t BarEdge() const;
+    static std::int32_t BarThickness();
+    /// The furthest that the text can be scrolled.
+    CPoint Largest() const;
+    /// Cut to what there is; the bar follows, also where only the text or the field has changed.
+    void ScrollTo(CPoint to);
+    void PlaceBar();
+    /// Brings the caret into sight.
+    void Reveal();
 
     // Caret.
     static void Blink(void *field);
@@ -129,7 +141,8 @@ private:
     std::string restored;                                         ///< what Escape comes back to
     mutable CTextLines layout;
     CPoint scroll;
-    double wantedX = -1; ///< of the caret while it goes up and down; -1 for where it is
+    CScrollBar *bar = nullptr; ///< a child, once one was needed
+    double wantedX = -1;       ///< of the caret while it goes up and down; -1 for where it is
     bool caretShown = false;
     int blinks = 0;
     CTimer blink;

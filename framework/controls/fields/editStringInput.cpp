@@ -73,9 +73,10 @@ private:
         const double above = several ? room.top - p.y : room.left - p.x;
         if (below <= 0 && above <= 0)
             return;
-        double &at = several ? self.field.scroll.y : self.field.scroll.x;
-        const CPoint most = self.field.Largest();
-        at = std::clamp(at + (below > 0 ? scrollStep : -scrollStep), 0.0, several ? most.y : most.x);
+        CPoint to = self.field.scroll;
+        (several ? to.y : to.x) += below > 0 ? scrollStep : -scrollStep;
+        self.field.ScrollTo(to);
+        // The caret follows the pointer and is brought into sight: the further outside, the faster.
         self.Track();
     }
 
@@ -104,24 +105,6 @@ bool CEditString::MouseDown(const CMouseEvent &e)
         MoveTo(at, e.Shift());
     CTextTracker tracker(*this, e.clicks == 2 && !Has(kEdit_Password));
     tracker.Run(e);
-    return true;
-}
-
-bool CEditString::MouseWheel(const CMouseEvent &e)
-{
-    const CPoint most = Largest();
-    if (!SeveralLines() || most.y <= 0 || e.wheelY == 0)
-        return false;
-    scroll.y = std::clamp(scroll.y - e.wheelY * 3 * Lines().LineHeight(), 0.0, most.y);
-    Invalidate();
-    return true;
-}
-
-bool CEditString::CursorAt(CPoint, Platform::cursor &cursor)
-{
-    if (!IsEnabled())
-        return false;
-    cursor.shape = Platform::cursorShape::text;
     return true;
 }
 

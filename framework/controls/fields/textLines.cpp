@@ -19,37 +19,28 @@ bool isTail(char byte)
 
 void CTextLines::Set(const std::string &newText, const shape &newShape)
 {
-    if (form == newShape && block && laidOut == newText)
+    if (form == newShape && made && text == newText)
         return;
     form = newShape;
-    laidOut = newText;
-    block.reset();
-}
-
-const Platform::textBlock &CTextLines::Block() const
-{
-    if (!block)
-    {
-        std::string dots;
-        if (form.dotted)
-            for (const char c : laidOut)
-                if (!isTail(c))
-                    dots += dot;
-        block.emplace(form.dotted ? dots : laidOut, form.font,
-                      Platform::textOptions{.width = form.lines ? form.width : 0,
-                                            .lines = form.lines,
-                                            .align = form.lines ? form.align : Platform::textAlign::left});
-    }
-    return *block;
+    text = newText;
+    made = true;
+    std::string dots;
+    if (form.dotted)
+        for (const char c : text)
+            if (!isTail(c))
+                dots += dot;
+    pieces.Set(form.dotted ? dots : text, form.font,
+               Platform::textOptions{.width = form.lines ? form.width : 0,
+                                     .lines = form.lines,
+                                     .align = form.lines ? form.align : Platform::textAlign::left});
 }
 
 std::size_t CTextLines::Shown(std::size_t offset) const
 {
     if (!form.dotted)
         return offset;
-    const auto end = laidOut.begin() + static_cast<std::ptrdiff_t>(std::min(offset, laidOut.size()));
-    return dot.size() *
-           static_cast<std::size_t>(std::count_if(laidOut.begin(), end, [](char c) { return !isTail(c); }));
+    const auto end = text.begin() + static_cast<std::ptrdiff_t>(std::min(offset, text.size()));
+    return dot.size() * static_cast<std::size_t>(std::count_if(text.begin(), end, [](char c) { return !isTail(c); }));
 }
 
 std::size_t CTextLines::FromShown(std::size_t offset) const
@@ -57,51 +48,47 @@ std::size_t CTextLines::FromShown(std::size_t offset) const
     if (!form.dotted)
         return offset;
     std::size_t left = offset / dot.size(), at = 0;
-    for (; at < laidOut.size() && (left > 0 || isTail(laidOut[at])); ++at)
-        if (!isTail(laidOut[at]))
+    for (; at < text.size() && (left > 0 || isTail(text[at])); ++at)
+        if (!isTail(text[at]))
             --left;
     return at;
 }
 
-double CTextLines::LineHeight() const
-{
-    return Block().caret(0).height();
-}
-
 Platform::rectangle CTextLines::Caret(std::size_t offset) const
 {
-    return Block().caret(Shown(offset));
+    return pieces.Caret(Shown(offset));
 }
 
-std::vector<Platform::rectangle> CTextLines::Covered(std::size_t from, std::size_t to) const
+std::vector<Platform::rectangle> CTextLines::Covered(std::size_t from, std::size_t to,
+                                                     const CTextPieces::span &sight) const
 {
-    return Block().covered(Shown(from), Shown(to));
+    return pieces.Covered(Shown(from), Shown(to), sight);
 }
 
 std::size_t CTextLines::OffsetAt(CPoint p) const
 {
     // In one line, above and below are no directions.
-    return FromShown(Block().offsetAt({p.x, form.lines ? p.y : LineHeight() / 2}));
+    return FromShown(pieces.OffsetAt({p.x, form.lines ? p.y : LineHeight() / 2}));
 }
 
 std::size_t CTextLines::Next(std::size_t offset) const
 {
-    return FromShown(Block().nextCharacter(Shown(offset)));
+    return FromShown(pieces.NextCharacter(Shown(offset)));
 }
 
 std::size_t CTextLines::Previous(std::size_t offset) const
 {
-    return FromShown(Block().previousCharacter(Shown(offset)));
+    return FromShown(pieces.PreviousCharacter(Shown(offset)));
 }
 
 std::size_t CTextLines::NextWord(std::size_t offset) const
 {
-    return form.dotted ? laidOut.size() : Block().nextWord(offset);
+    return form.dotted ? text.size() : pieces.NextWord(offset);
 }
 
 std::size_t CTextLines::PreviousWord(std::size_t offset) const
 {
-    return form.dotted ? 0 : Block().previousWord(offset);
+    return form.dotted ? 0 : pieces.PreviousWord(offset);
 }
 
 std::size_t CTextLines::LineStart(std::size_t offset) const
@@ -115,7 +102,7 @@ std::size_t CTextLines::LineStart(std::size_t offset) const
 std::size_t CTextLines::LineEnd(std::size_t offset) const
 {
     if (!form.lines)
-        return laidOut.size();
+        return text.size();
     const Platform::rectangle at = Caret(offset);
     const std::size_t end = OffsetAt({farRight, (at.top + at.bottom) / 2});
     // The end of a line that was broken is the beginning of the next one.
@@ -128,7 +115,7 @@ std::size_t CTextLines::Below(std::size_t offset, double x, double by) const
     const double y = (at.top + at.bottom) / 2 + by;
     if (y < 0)
         return 0;
-    return y >= Block().height() ? laidOut.size() : OffsetAt({x, y});
+    return y >= pieces.Height() ? text.size() : OffsetAt({x, y});
 }
 
 } // namespace Sarnik

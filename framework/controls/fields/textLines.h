@@ -1,10 +1,9 @@
 #pragma once
 
+#include "framework/controls/fields/textPieces.h"
 #include "framework/views/port.h"
-#include "platform/canvas/text.h"
 
 #include <cstddef>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -29,11 +28,15 @@ public:
 
     void Set(const std::string &newText, const shape &newShape);
 
-    const Platform::textBlock &Block() const;
+    /// The same text and shape cost no more than a comparison, a change what is to be laid out again for it.
+    const CTextPieces &Pieces() const { return pieces; }
+    double Width() const { return pieces.Width(); }
+    double Height() const { return pieces.Height(); }
     /// Of one line.
-    double LineHeight() const;
+    double LineHeight() const { return pieces.LineHeight(); }
     Platform::rectangle Caret(std::size_t offset) const;
-    std::vector<Platform::rectangle> Covered(std::size_t from, std::size_t to) const;
+    /// What can be seen of a selection.
+    std::vector<Platform::rectangle> Covered(std::size_t from, std::size_t to, const CTextPieces::span &sight) const;
     std::size_t OffsetAt(CPoint p) const;
 
     std::size_t Next(std::size_t offset) const;
@@ -50,9 +53,10 @@ private:
     std::size_t Shown(std::size_t offset) const;
     std::size_t FromShown(std::size_t offset) const;
 
-    std::string laidOut; ///< the text that the block is of
+    std::string text;
     shape form;
-    mutable std::optional<Platform::textBlock> block;
+    bool made = false;  ///< Set was called
+    CTextPieces pieces; ///< of what is shown of the text
 };
 
 } // namespace Sarnik

@@ -1,5 +1,6 @@
 #include "framework/base/alerts.h"
 #include "framework/controls/fields/editNumber.h"
+#include "framework/controls/scrolling/scrollBar.h"
 #include "tests/framework/controls/valueStage.h"
 
 #include <random>
@@ -166,6 +167,53 @@ TEST_F(fields, ThePointerSelectsCharactersWordsAndAll)
     display.move(100, 20);
     Run();
     EXPECT_EQ(display.shownCursor().shape, Platform::cursorShape::text);
+}
+
+TEST_F(fields, HighTextsAreScrolledByWheelBarAndSelection)
+{
+    std::string text;
+    for (int i = 0; i < 60; ++i)
+        text += "line " + std::to_string(i) + "\n";
+    for (const std::uint32_t options : {unsigned{kEdit_MultiLine}, unsigned{kEdit_MultiLine | kEdit_ReadOnly}})
+    {
+        CEditString &field = Field("short", options, {10, 10, 160, 110});
+        EXPECT_THAT(field.Children(), IsEmpty());
+        field.SetValue(text);
+        Press(key::home, ctrlModifier);
+        ASSERT_THAT(field.Children(), testing::SizeIs(1));
+        auto &bar = dynamic_cast<CScrollBar &>(*field.Children().front());
+        ExpectFreshScreen();
+        // What a click selects tells which part of the text is seen.
+        const auto lineAt = [&](double y) {
+            display.press(20, y, 1, 2).release(20, y).tap(key::home).with(shiftModifier).tap(key::end).with(0);
+            Run();
+            return std::string(field.Editor().Selected());
+        };
+        EXPECT_EQ(lineAt(20), "line 0");
+        display.wheel(50, 50, -2);
+        Run();
+        EXPECT_EQ(lineAt(15), "line 6");
+        const auto x = double(field.Frame().left + bar.Frame().left + 4);
+        const Platform::rectangle thumb = bar.Thumb();
+        const double grip = field.Frame().top + bar.Frame().top + (thumb.top + thumb.bottom) / 2;
+        display.press(x, grip).move(x, grip + 200).release(x, grip + 200);
+        Run();
+        EXPECT_EQ(bar.Value(), bar.Largest());
+        EXPECT_EQ(display.shownCursor().shape, Platform::cursorShape::arrow);
+        EXPECT_EQ(lineAt(90), "line 59");
+        ExpectFreshScreen();
+        // Held above the field, the text comes down; the selection goes with it.
+        display.press(100, 60).move(100, 8).after(30).release(100, 8);
+        Run();
+        EXPECT_EQ(bar.Value(), 0);
+        EXPECT_EQ(field.Editor().Caret(), 6u);
+        EXPECT_GT(field.Editor().Anchor(), text.size() - 60);
+        field.SetValue("short again");
+        Run();
+        EXPECT_FALSE(bar.IsVisible());
+        ExpectFreshScreen();
+        panel.Remove(field);
+    }
 }
 
 /// Keys at random: the field stays within its limits, draws what a fresh paint would, and goes back all the way.
