@@ -15,6 +15,8 @@ namespace
 
 /// Between the frame and the text.
 constexpr double insetX = 5, insetY = 2;
+/// Of several lines, however narrow the field.
+constexpr double leastWidth = 30;
 /// Seconds between the caret's coming and going, and how often until it stands still.
 constexpr double blinkPeriod = 0.53;
 constexpr int mostBlinks = 40;
@@ -114,7 +116,7 @@ const CTextLines &CEditString::Lines() const
     layout.Set(editor.Text(), {.font = Font(),
                                .lines = several,
                                .dotted = Has(kEdit_Password),
-                               .width = several ? std::max(1.0, TextRoom().width() - 1) : 0,
+                               .width = several ? std::max(leastWidth, TextRoom().width() - 1) : 0,
                                .align = align == kAlign_Center ? Platform::textAlign::centre
                                         : align == kAlign_Far  ? Platform::textAlign::right
                                                                : Platform::textAlign::left});

@@ -73,10 +73,11 @@ void CTextPieces::Cut(std::vector<piece> before, std::vector<piece> after)
 {
     pieces = std::move(before);
     std::size_t start = pieces.empty() ? 0 : Following(pieces.back());
+    std::size_t missed = 0;
     for (auto next = after.begin();;)
     {
-        while (next != after.end() && next->start < start)
-            ++next;
+        for (; next != after.end() && next->start < start; ++next)
+            ++missed;
         if (next != after.end() && next->start == start)
         {
             pieces.insert(pieces.end(), std::move_iterator(next), std::move_iterator(after.end()));
@@ -92,7 +93,9 @@ void CTextPieces::Cut(std::vector<piece> before, std::vector<piece> after)
             else
                 break;
         }
-        pieces.push_back(Piece(start, preferred));
+        const bool early = missed >= limits.patience && preferred == std::string::npos && next != after.end() &&
+                           next->start - start <= limits.most;
+        pieces.push_back(early ? BrokenPiece(start, next->start) : Piece(start, preferred));
         if (pieces.back().End() == text.size())
             break;
         start = Following(pieces.back());
@@ -143,8 +146,12 @@ CTextPieces::piece CTextPieces::BrokenPiece(std::size_t start)
         end = start + tried.lastLine();
     else if (tried.previousCharacter(end - start) > 0) // one line that is as long as that
         end = start + tried.previousCharacter(end - start);
-    const std::size_t length = end - start - (text[end - 1] == ' ' ? 1 : 0);
-    return LayOut(start, length, edge::brokenLine);
+    return BrokenPiece(start, end);
+}
+
+CTextPieces::piece CTextPieces::BrokenPiece(std::size_t start, std::size_t end)
+{
+    return LayOut(start, end - start - (text[end - 1] == ' ' ? 1 : 0), edge::brokenLine);
 }
 
 std::size_t CTextPieces::Following(const piece &p) const

@@ -21,7 +21,10 @@ public:
     struct sizes
     {
         std::size_t usual = 1000; ///< lines that belong to one piece; up to twice as much where a piece grows
-        std::size_t most = 8000;  ///< of one paragraph
+        std::size_t most = 2000;  ///< of one paragraph; at least twice the usual
+        /// In a paragraph of many pieces a change moves what follows, mostly not far: a line soon begins where one did
+        /// before. After so many pieces without, one line ends early, so that the rest can stay as it is.
+        std::size_t patience = 2;
     };
     CTextPieces() = default;
     explicit CTextPieces(const sizes &of) : limits(of) {}
@@ -79,6 +82,7 @@ private:
     piece LayOut(std::size_t start, std::size_t length, edge after);
     piece Piece(std::size_t start, std::size_t preferredEnd);
     piece BrokenPiece(std::size_t start);
+    piece BrokenPiece(std::size_t start, std::size_t end);
     std::size_t Kept(std::size_t same) const;
     void Cut(std::vector<piece> before, std::vector<piece> after);
 

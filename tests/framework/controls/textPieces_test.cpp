@@ -63,7 +63,7 @@ TEST(TextPieces, AreTheWholeTextAfterAnyChange)
                                           {true, Platform::textAlign::right}})
     {
         const Platform::textOptions options{.width = 200, .lines = true, .align = align};
-        CTextPieces pieces({.usual = 30, .most = 150});
+        CTextPieces pieces({.usual = 30, .most = 150, .patience = 1000});
         std::string text;
         for (int change = 0; change < 150; ++change)
         {
@@ -87,20 +87,20 @@ TEST(TextPieces, AreTheWholeTextAfterAnyChange)
 /// The work for a key does not grow with the text.
 TEST(TextPieces, OnlyWhatStandsAroundAChangeIsLaidOut)
 {
-    std::string lines, paragraph;
+    std::string lines, paragraph, letters(30'000, 'a');
     for (int i = 0; lines.size() < 100'000; ++i)
     {
         lines += "fifty letters or so in every line of a long text, " + std::to_string(i) + "\n";
         paragraph += "words of all lengths, at " + std::to_string(i) + " and ";
     }
     const Platform::textOptions options{.width = 200, .lines = true};
-    for (std::string *const text : {&lines, &paragraph})
+    for (std::string *const text : {&lines, &paragraph, &letters})
     {
         CTextPieces pieces;
         pieces.Set(*text, font, options);
         const std::size_t first = pieces.BytesLaidOut();
         EXPECT_LE(first, 2.2 * text->size());
-        const std::size_t most = text == &lines ? 3'000 : 60'000;
+        const std::size_t most = text == &lines ? 3'000 : 20'000;
         std::mt19937 random(3);
         for (int i = 0; i < 40; ++i)
         {
@@ -109,6 +109,8 @@ TEST(TextPieces, OnlyWhatStandsAroundAChangeIsLaidOut)
             pieces.Set(*text, font, options);
             EXPECT_GT(pieces.BytesLaidOut(), before);
             EXPECT_LE(pieces.BytesLaidOut() - before, most) << "change " << i << " at " << at;
+            const Platform::rectangle caret = pieces.Caret(at);
+            EXPECT_EQ(pieces.OffsetAt({caret.left, caret.top + 1}), at);
         }
         // All of it again, once, for another shape; nothing for the same.
         const std::size_t before = pieces.BytesLaidOut();
