@@ -71,7 +71,8 @@ void galleryDialog::Fill()
 
     Find<CEditString>("gallery/name")->SetValue("The quick brown fox");
     Find<CEditString>("gallery/password")->SetValue("secret");
-    Find<CEditString>("gallery/notes")->SetValue("Several lines, scrolled\nas far as needed,\nby wheel, bar and caret.\n\nThe end.");
+    Find<CEditString>("gallery/notes")
+        ->SetValue("Several lines, scrolled\nas far as needed,\nby wheel, bar and caret.\n\nThe end.");
     Find<CEditSlider>("gallery/size")->SetResponse(CSliderResponse::Linear({{0.618, 0.1}}));
 
     Find<CRadioPopup>("gallery/noise")
