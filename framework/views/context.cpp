@@ -47,6 +47,7 @@ std::unique_ptr<CView> CContext::Remove(CView &view)
     children.erase(found);
     removed->container = nullptr;
     removed->SetParent(nullptr);
+    ChildLeft(*removed);
     return removed;
 }
 

@@ -49,6 +49,8 @@ public:
 protected:
     CContext() = default;
     void DeleteChildren() noexcept;
+    /// A child was handed out. Not told of those that go with this.
+    virtual void ChildLeft(const CView &) {}
     /// The bounds have changed from these: children follow by their bindings.
     void BoundsChanged(const CRect &old);
 

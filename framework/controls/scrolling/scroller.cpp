@@ -26,7 +26,7 @@ std::int32_t whole(double v)
 } // namespace
 
 CScroller::CScroller(const CRect &viewFrame, std::uint32_t scrollerAttributes)
-    : CLayoutPane(viewFrame), well(&Make<CPane>()), xBar(&Make<CScrollBar>()), yBar(&Make<CScrollBar>()),
+    : CLayoutPane(viewFrame), well(&Make<CWell>()), xBar(&Make<CScrollBar>()), yBar(&Make<CScrollBar>()),
       attributes(scrollerAttributes)
 {
     xBar->SetId(xBarId);
@@ -90,6 +90,21 @@ CView &CScroller::SetContent(std::unique_ptr<CView> view)
     well->Add(std::move(view));
     Arrange();
     return *content;
+}
+
+void CScroller::CWell::ChildLeft(const CView &)
+{
+    auto &scroller = static_cast<CScroller &>(*ParentView());
+    scroller.content = nullptr;
+    scroller.informed = nullptr;
+    scroller.Arrange();
+}
+
+void CScroller::ChildLeft(const CView &gapView)
+{
+    for (CView *&gap : gapViews)
+        if (gap == &gapView)
+            gap = nullptr;
 }
 
 void CScroller::TakeChild(std::unique_ptr<CView> child, std::int32_t interior)

@@ -46,7 +46,7 @@ public:
 
     static constexpr std::uint32_t kScroller_AllBars = kScroller_XBar | kScroller_YBar;
 
-    /// Takes the place of the one before.
+    /// Takes the place of the one before, or of one that was taken out of its parent view.
     CView &SetContent(std::unique_ptr<CView> view);
     CView *Content() const { return content; }
     std::uint32_t Attributes() const { return attributes; }
@@ -83,8 +83,16 @@ public:
 protected:
     void ReadProperties(const CLayoutPlacement &placement, const CWyraVariablePropertyList &properties) override;
     void TakeChild(std::unique_ptr<CView> child, std::int32_t interior) override;
+    void ChildLeft(const CView &gapView) override;
 
 private:
+    /// Shows of the content what is within.
+    class CWell : public CPane
+    {
+    protected:
+        void ChildLeft(const CView &content) override;
+    };
+
     bool Scrolls(std::uint32_t axis, std::uint32_t bar) const;
     CLayoutSize Wanted(CLayoutSize seen) const;
     CLayoutSize Step() const;
@@ -92,7 +100,7 @@ private:
     bool MoveTo(CPoint to);
     void PlaceContent(CPoint to, CLayoutSize size);
 
-    CPane *well;
+    CWell *well;
     CScrollBar *xBar, *yBar;
     CView *content = nullptr;
     CScrollContent *informed = nullptr; ///< the content, where it is one

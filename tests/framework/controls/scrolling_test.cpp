@@ -177,6 +177,12 @@ TEST_F(scrolling, ScrollerMovesItsContent)
     scroller.SetAttributes(kScroller_XBar | kScroller_YBar | kScroller_AutoHideScrollBars);
     EXPECT_TRUE(scroller.Geometry().yBar.Empty());
     EXPECT_FALSE(scroller.Geometry().xBar.Empty());
+
+    // The content may go its own way.
+    EXPECT_NE(content.ParentView()->Remove(content), nullptr);
+    EXPECT_EQ(scroller.Content(), nullptr);
+    scroller.SetFrame({0, 0, 100, 100});
+    EXPECT_EQ(scroller.Largest(), (CPoint{0, 0}));
 }
 
 TEST_F(scrolling, CellsOfEveryFlowAreFoundWhereTheyLie)
