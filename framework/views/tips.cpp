@@ -61,7 +61,7 @@ void CTipWatch::TimerFired(void *watch)
 void CTipWatch::Moved(CView *view, CPoint to)
 {
     CTip tip;
-    CView *asked = view;
+    const CView *asked = view;
     for (CView *from = view; from != nullptr && (tip.text.empty() || tip.help.empty()); from = from->ParentView())
     {
         CTip answer;
@@ -76,13 +76,24 @@ void CTipWatch::Moved(CView *view, CPoint to)
         if (tip.help.empty())
             tip.help = std::move(answer.help);
     }
+    if (CTip own; (tip.text.empty() || tip.help.empty()) && window.PointerInside() && window.GetTip(to, own))
+    {
+        if (tip.text.empty() && !own.text.empty())
+        {
+            tip.text = std::move(own.text);
+            tip.rect = own.rect;
+            asked = nullptr;
+        }
+        if (tip.help.empty())
+            tip.help = std::move(own.help);
+    }
 
     std::string newHelp = Localize(tip.help);
     if (newHelp != help)
         window.SetHelp(help = std::move(newHelp));
 
     at = to;
-    const CRect newRect = tip.text.empty() ? CRect{} : asked->ToWindow(tip.rect);
+    const CRect newRect = tip.text.empty() ? CRect{} : asked == nullptr ? tip.rect : asked->ToWindow(tip.rect);
     if (tip.text != text || newRect != rect)
     {
         Hide();

@@ -190,28 +190,8 @@ void CWindow::HandleResize()
         FrameChanged();
 }
 
-CObjID CWindow::RunModal(CWindow *by)
+CWindow::modalSession::modalSession(CWindow &over, CWindow *owner) : application(*CApplication::Current()), window(over)
 {
-    CApplication &application = *CApplication::Current();
-    /// However the loop ends.
-    struct modality
-    {
-        modality(CApplication &a, CWindow &w) : application(a), window(w) { application.modal.push_back(&window); }
-        ~modality()
-        {
-            std::erase(application.modal, &window);
-            CWindow *const owner = window.IsActive() ? window.owner : nullptr;
-            window.Close();
-            // Not every window manager hands the keyboard back, and there may be none.
-            if (owner != nullptr)
-                owner->Activate();
-        }
-        CApplication &application;
-        CWindow &window;
-    };
-
-    Restart();
-    modalResult = {};
     // The release of a button that is down will not come to where it was pressed, and a tracker would keep its input
     // from the modal window.
     if (CTracker *const running = CTracker::Current())
@@ -219,10 +199,27 @@ CObjID CWindow::RunModal(CWindow *by)
     for (CWindow *w = application.windows.Head(); w != nullptr; w = w->Next())
         w->EndPress();
     application.DismissPopups();
-    Open(by);
-    const modality held(application, *this);
+    window.Open(owner);
+    application.modal.push_back(&window);
+}
+
+CWindow::modalSession::~modalSession()
+{
+    std::erase(application.modal, &window);
+    CWindow *const owner = window.IsActive() ? window.owner : nullptr;
+    window.Close();
+    // Not every window manager hands the keyboard back, and there may be none.
+    if (owner != nullptr)
+        owner->Activate();
+}
+
+CObjID CWindow::RunModal(CWindow *by)
+{
+    Restart();
+    modalResult = {};
+    const modalSession held(*this, by);
     while (!Ended())
-        application.ProcessOne();
+        CApplication::Current()->ProcessOne();
     return modalResult;
 }
 

@@ -17,9 +17,11 @@
 namespace Sarnik
 {
 
+class CApplication;
 class CView;
 class CTracker;
 class CDragSession;
+struct CTip;
 
 /// Bits of a window's features, as layouts write them.
 enum EWindowFeatures : std::uint32_t
@@ -78,6 +80,21 @@ public:
     void SetSettings(CWindowSettings with);
 
     // The modal loop.
+    /// As long as it lives the window is open, and other windows but those that this one owns get no input; for who
+    /// has work of his own to do between turns of the loop. Closes the window at its end.
+    class modalSession
+    {
+    public:
+        /// Opens the window if it is not. Throws CError where there is no display.
+        explicit modalSession(CWindow &over, CWindow *owner = nullptr);
+        ~modalSession();
+        modalSession(const modalSession &) = delete;
+        modalSession &operator=(const modalSession &) = delete;
+
+    private:
+        CApplication &application;
+        CWindow &window;
+    };
     /// Opens the window if it is not, and runs until EndModal, End or the closing: with what it ended, none for the
     /// closing. Other windows but those that this one owns get no input. Closes the window. Throws CError where the
     /// display is lost.
@@ -141,7 +158,10 @@ public:
     // Help, tips and pointer.
     /// The view under the pointer offers its help; empty where it has none. Localised.
     virtual void SetHelp(const std::string &) {}
-    /// Asks for tip, help and pointer's shape anew: something under the pointer has changed.
+    /// What to say at a point where the views there have no tip, or no help.
+    virtual bool GetTip(CPoint, CTip &) { return false; }
+    /// As if the pointer had moved to where it is: something under it has changed, or a modifier key. While a press or
+    /// a tracker has the pointer only its shape is asked for.
     void RefreshPointer();
     /// Where the pointer was last seen.
     CPoint Pointer() const { return pointer; }
@@ -189,7 +209,6 @@ private:
     bool pointerInside = false;
     bool showsFocus = false;
     bool trackerRan = false; ///< within the press that is being handled
-    std::uint32_t pointerModifiers = 0;
     Platform::cursor cursor;
     CObjID modalResult;
 };

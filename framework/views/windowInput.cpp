@@ -49,7 +49,6 @@ void CWindow::HandlePointer(const Platform::event &e)
     pointerInside = e.kind != eventKind::pointerLeave;
     if (pointerInside)
         pointer = e.at;
-    pointerModifiers = e.modifiers;
     if (tracker != nullptr)
     {
         if (pointerInside)
@@ -182,11 +181,13 @@ void CWindow::UpdateCursor()
 
 void CWindow::RefreshPointer()
 {
-    if (!IsOpen() || tracker != nullptr || pressed != nullptr || !pointerInside)
+    if (!IsOpen() || !pointerInside)
         return;
+    if (tracker != nullptr || pressed != nullptr)
+        return UpdateCursor();
     CMouseEvent e;
     e.at = e.inWindow = pointer;
-    e.modifiers = pointerModifiers;
+    e.modifiers = CApplication::Current()->Display().modifiers();
     Hover(ViewAt(pointer), e);
 }
 

@@ -23,6 +23,12 @@ CFileChoice refused(const std::string &path, std::string_view pattern)
     return {CFileChoice::outcome::refuse, path, Localize(pattern, {fileNameOf(path)})};
 }
 
+bool hasExtensionOf(const std::vector<CFileType> &types, std::string_view name)
+{
+    return std::any_of(types.begin(), types.end(),
+                       [&](const CFileType &t) { return !t.extensions.empty() && t.Fits(name); });
+}
+
 constexpr std::string_view notAFile = "$$$/Sarnik/Navigator/NotAFile=\"^0\" is not a file.";
 
 } // namespace
@@ -42,7 +48,8 @@ CFileChoice choiceToOpen(const std::string &folder, std::string_view typed)
     return {CFileChoice::outcome::take, path, {}};
 }
 
-CFileChoice choiceToSave(const std::string &folder, std::string_view typed, const CFileType &type)
+CFileChoice choiceToSave(const std::string &folder, std::string_view typed, const CFileType &type,
+                         const std::vector<CFileType> &known)
 {
     std::string path = typedPath(folder, typed);
     struct stat status;
@@ -51,7 +58,7 @@ CFileChoice choiceToSave(const std::string &folder, std::string_view typed, cons
     // "name/" can only have meant a folder.
     if (typed.ends_with('/'))
         return refused(path, ENOENT);
-    if (!type.extensions.empty() && !type.Fits(path))
+    if (!type.extensions.empty() && !type.Fits(path) && !hasExtensionOf(known, path))
         path += '.' + type.extensions.front();
     if (stat(path.c_str(), &status) == 0)
     {
@@ -74,10 +81,7 @@ std::string nameForType(std::string_view name, const CFileType &type, const std:
     if (type.extensions.empty() || name.empty() || type.Fits(name))
         return std::string(name);
     const std::string extension = extensionOf(name);
-    const bool isKnown = !extension.empty() && std::any_of(known.begin(), known.end(), [&](const CFileType &t) {
-        return !t.extensions.empty() && t.Fits(name);
-    });
-    if (isKnown)
+    if (!extension.empty() && hasExtensionOf(known, name))
         name.remove_suffix(extension.size() + 1);
     return std::string(name) + '.' + type.extensions.front();
 }

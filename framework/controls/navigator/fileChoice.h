@@ -27,8 +27,10 @@ struct CFileChoice
 
 /// For opening: the file has to be there and to be readable.
 CFileChoice choiceToOpen(const std::string &folder, std::string_view typed);
-/// For saving: the folder has to be there. A name without one of the type's extensions gets the first of them.
-CFileChoice choiceToSave(const std::string &folder, std::string_view typed, const CFileType &type);
+/// For saving: the folder has to be there. A name without an extension of the type, nor of another one of `known`, gets
+/// the type's first one.
+CFileChoice choiceToSave(const std::string &folder, std::string_view typed, const CFileType &type,
+                         const std::vector<CFileType> &known = {});
 /// A name for another type: an extension of one of `known` gives way to the first of `type`.
 std::string nameForType(std::string_view name, const CFileType &type, const std::vector<CFileType> &known);
 

@@ -54,8 +54,8 @@ public:
     bool Run(CWindow *parent, std::string &path) override { return RunWindow(parent, false, {}, path); }
 };
 
-/// A file to be written; whether one of that name may be replaced has been asked. The name has an extension of the
-/// chosen type.
+/// A file to be written; whether one of that name may be replaced has been asked. The name has an extension of
+/// one of the types, of the chosen one where the user typed none of them.
 class CSaveFile : public CNavigator
 {
 public:

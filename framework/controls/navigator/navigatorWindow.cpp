@@ -190,8 +190,8 @@ void CNavigatorWindow::Take(const std::string &typed)
 {
     if (typed.empty())
         return;
-    const CFileChoice choice =
-        asked.saving ? choiceToSave(folder, typed, asked.types[asked.typeIndex]) : choiceToOpen(folder, typed);
+    const CFileChoice choice = asked.saving ? choiceToSave(folder, typed, asked.types[asked.typeIndex], asked.types)
+                                            : choiceToOpen(folder, typed);
     switch (choice.what)
     {
     case CFileChoice::outcome::enterFolder:

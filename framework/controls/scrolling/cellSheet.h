@@ -125,6 +125,8 @@ protected:
     /// A press on a cell, as far as the selection goes, with the drag that follows where the options say so. The sheet
     /// may be gone afterwards.
     void SelectionClick(int cell, const CMouseEvent &e);
+    /// The same without a drag, for who lets a drag that follows do something else. The sheet may be gone afterwards.
+    void SelectionPress(int cell, std::uint32_t modifiers);
     /// Enter or a double click on a cell: by default the command of the sheet's id. Whether anybody wanted it.
     virtual bool Open(int cell);
     /// Below the cell's own drawing: by default what shows that it is selected.

@@ -48,7 +48,7 @@ protected:
     bool Begin() override
     {
         // Here, since a tracker notices when its view goes.
-        sheet.ChangeByUser([this] { return sheet.ChangeByPress(cell, Modifiers()); });
+        sheet.SelectionPress(cell, Modifiers());
         timer.Start();
         return View() != nullptr;
     }
@@ -84,7 +84,12 @@ void CCellSheet::SelectionClick(int cell, const CMouseEvent &e)
     if ((cellBits & (kCellSheet_TrackSelect | kCellSheet_TrackRange)) != 0)
         selectTracker(*this, cell).Run(e);
     else
-        ChangeByUser([&] { return ChangeByPress(cell, e.modifiers); });
+        SelectionPress(cell, e.modifiers);
+}
+
+void CCellSheet::SelectionPress(int cell, std::uint32_t modifiers)
+{
+    ChangeByUser([&] { return ChangeByPress(cell, modifiers); });
 }
 
 CPoint CCellSheet::ContextPoint() const

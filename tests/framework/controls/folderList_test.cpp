@@ -90,6 +90,8 @@ TEST_F(Folder, DecidesAboutATypedName)
     EXPECT_EQ(choiceToSave(here, "none/new", workspace).what, outcome::refuse);
 
     const CFileType png{"PNG", {"png"}}, any{"All", {}};
+    EXPECT_EQ(choiceToSave(here, "new.PNG", workspace, {workspace, png, any}).path, here + "/new.PNG");
+    EXPECT_EQ(choiceToSave(here, "new.txt", workspace, {workspace, png, any}).path, here + "/new.txt.dbw");
     EXPECT_EQ(nameForType("a.dbw", png, {workspace, png, any}), "a.png");
     EXPECT_EQ(nameForType("a.b", png, {workspace, png, any}), "a.b.png");
     EXPECT_EQ(nameForType("a.dbw", any, {workspace, any}), "a.dbw");

@@ -149,6 +149,15 @@ TEST_F(input, TipsAppearAfterARestAndHelpAtOnce)
     display.move(150, 30);
     EXPECT_THAT(Told(), testing::Contains("help "));
     EXPECT_EQ(display.windows().size(), 1u) << "gone with the pointer";
+
+    // Where views have nothing to say the window is asked.
+    window.tipAt = [](CPoint at, CTip &tip) {
+        tip.help = "Window " + std::to_string(int(at.x));
+        return at.x < 160;
+    };
+    display.move(25, 25).move(151, 30).move(165, 30);
+    EXPECT_THAT(Told(), testing::AllOf(testing::Contains("help All of it"), testing::Contains("help Window 151"),
+                                       testing::Not(testing::Contains("help Window 25"))));
 }
 
 struct dropTarget : notingPane, CDropTarget

@@ -120,10 +120,12 @@ struct stage : testing::Test
             entries.push_back("command " + m.Id().Name());
             return true;
         }
+        bool GetTip(CPoint at, CTip &tip) override { return tipAt && tipAt(at, tip); }
         void SetHelp(const std::string &text) override { entries.push_back("help " + text); }
 
         Log &entries;
         std::function<bool(CKeyboardMessage &)> filter;
+        std::function<bool(CPoint, CTip &)> tipAt;
         bool commandEnabled = true;
     };
 
