@@ -178,6 +178,18 @@ void CWindow::SetFrame(const CRect &newFrame)
     FrameChanged();
 }
 
+CRect CWindow::LargestFrame(std::int32_t margin) const
+{
+    const Platform::rectangle area = CApplication::Current()->Display().workArea();
+    const Platform::rectangle border = IsOpen() ? screen->border() : Platform::rectangle{};
+    const auto in = [](double v) { return CRect::Clamped(std::llround(std::ceil(v))); };
+    const std::int32_t left = in(area.left + border.left + margin), top = in(area.top + border.top + margin);
+    const auto to = [](std::int32_t from, double v) {
+        return std::max(from + 1, CRect::Clamped(std::llround(std::floor(v))));
+    };
+    return {left, top, to(left, area.right - border.right - margin), to(top, area.bottom - border.bottom - margin)};
+}
+
 /// The display says that the size or the scale is another one.
 void CWindow::HandleResize()
 {

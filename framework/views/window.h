@@ -70,6 +70,9 @@ public:
     /// Of the content, in view units of the screen.
     CRect Frame() const;
     void SetFrame(const CRect &newFrame);
+    /// The frame with which an open window, with what the display draws around it, fills the screen less the system's
+    /// bars but for a margin.
+    CRect LargestFrame(std::int32_t margin = 0) const;
     CRect Bounds() const override;
     CPoint ToScreen(CPoint p) const;
     CWindow *Window() const override { return const_cast<CWindow *>(this); }

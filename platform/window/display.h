@@ -77,6 +77,8 @@ public:
     /// Without the frame, in view units of the screen.
     virtual rectangle place() const = 0;
     virtual void setPlace(const rectangle &place) = 0;
+    /// How thick the display's own frame is on each side, in view units; nothing while that is not known.
+    virtual rectangle border() const = 0;
     /// A resizable window never gets smaller. View units.
     virtual void setSmallest(double width, double height) = 0;
     virtual void setTitle(std::string_view title) = 0;

@@ -59,6 +59,11 @@ void memoryWindow::setPlace(const rectangle &place)
     owner.happen({.kind = eventKind::resize, .window = number});
 }
 
+rectangle memoryWindow::border() const
+{
+    return settings.kind == windowKind::normal ? owner.frameBorder : rectangle{};
+}
+
 void memoryWindow::show(bool visible)
 {
     if (isVisible == visible)

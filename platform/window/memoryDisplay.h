@@ -23,6 +23,7 @@ public:
     double scale() const override;
     rectangle place() const override { return where; }
     void setPlace(const rectangle &place) override;
+    rectangle border() const override;
     void setSmallest(double width, double height) override { smallest = {width, height}; }
     void setTitle(std::string_view title) override { settings.title = title; }
     void show(bool visible) override;
@@ -101,6 +102,8 @@ public:
     /// The user drags the window's edge.
     memoryDisplay &resize(double width, double height);
     memoryDisplay &loseDisplay();
+    /// Frames of normal windows from now on, as window::border.
+    void setBorder(const rectangle &thickness) { frameBorder = thickness; }
     /// Another number of pixels per unit; every window gets a resize event.
     void changeScale(double pixelsPerUnit);
 
@@ -117,6 +120,7 @@ private:
     void happen(const event &e);
 
     double unit;
+    rectangle frameBorder;
     double time = 0, scriptTime = 0;
     std::multimap<double, event> script; ///< by the time of their coming
     std::map<windowId, memoryWindow *> openWindows;

@@ -69,6 +69,7 @@ public:
     double scale() const override { return pixelsPerPoint * link.pointsPerUnit; }
     rectangle place() const override;
     void setPlace(const rectangle &place) override;
+    rectangle border() const override;
     void setSmallest(double width, double height) override;
     void setTitle(std::string_view title) override;
     void show(bool visible) override;

@@ -96,6 +96,15 @@ void sdlWindow::setPlace(const rectangle &place)
     SDL_SetWindowSize(handle, wholeSide(place.width() * f), wholeSide(place.height() * f));
 }
 
+rectangle sdlWindow::border() const
+{
+    int left = 0, top = 0, right = 0, bottom = 0;
+    if (!link.usable() || SDL_GetWindowBordersSize(handle, &top, &left, &bottom, &right) != 0)
+        return {};
+    const double f = link.pointsPerUnit;
+    return {left / f, top / f, right / f, bottom / f};
+}
+
 void sdlWindow::setSmallest(double width, double height)
 {
     if (link.usable())

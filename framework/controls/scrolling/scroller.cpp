@@ -177,7 +177,10 @@ void CScroller::Arrange()
 
 CPoint CScroller::Position() const
 {
-    return content == nullptr ? CPoint{} : CPoint{-1.0 * content->Frame().left, -1.0 * content->Frame().top};
+    if (content == nullptr)
+        return {};
+    const CRect &frame = content->Frame();
+    return {static_cast<double>(-frame.left), static_cast<double>(-frame.top)}; // as integers: no -0
 }
 
 CPoint CScroller::Largest() const

@@ -206,6 +206,10 @@ TEST_P(painting, ResizingAndScalingDrawAnew)
     display.changeScale(3);
     EXPECT_EQ(Everything().width(), 900);
     EXPECT_EQ(window.Bounds(), (CRect{0, 0, 300, 200})) << "view units stay";
+
+    display.changeScale(1);
+    display.setBorder({3, 24, 3, 5});
+    EXPECT_EQ(window.LargestFrame(2), (CRect{5, 26, 1915, 1073})) << "the display's frame stays on the screen";
 }
 
 } // namespace
