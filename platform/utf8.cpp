@@ -9,6 +9,12 @@ namespace
 
 constexpr char32_t replacement = 0xFFFD;
 
+/// All bytes of a character but its first.
+bool isTail(char byte)
+{
+    return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
+}
+
 } // namespace
 
 std::size_t characterLength(std::string_view utf8)
@@ -23,7 +29,7 @@ std::size_t characterLength(std::string_view utf8)
     if (length == 0 || utf8.size() < length)
         return 0;
     for (std::size_t i = 1; i < length; ++i)
-        if ((byte(i) & 0xC0) != 0x80)
+        if (!isTail(utf8[i]))
             return 0;
     // Longer forms than needed, surrogates, and what lies above U+10FFFF.
     const unsigned second = byte(1);
@@ -31,6 +37,28 @@ std::size_t characterLength(std::string_view utf8)
         (lead == 0xF4 && second > 0x8F))
         return 0;
     return length;
+}
+
+std::size_t characterCount(std::string_view utf8)
+{
+    return utf8.size() - static_cast<std::size_t>(std::count_if(utf8.begin(), utf8.end(), isTail));
+}
+
+std::size_t bytesOfCharacters(std::string_view utf8, std::size_t count)
+{
+    std::size_t at = 0;
+    for (; at < utf8.size() && (count > 0 || isTail(utf8[at])); ++at)
+        if (!isTail(utf8[at]))
+            --count;
+    return at;
+}
+
+std::size_t characterStart(std::string_view utf8, std::size_t offset)
+{
+    offset = std::min(offset, utf8.size());
+    while (offset > 0 && offset < utf8.size() && isTail(utf8[offset]))
+        --offset;
+    return offset;
 }
 
 std::u32string codePoints(std::string_view utf8)

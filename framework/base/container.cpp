@@ -1,6 +1,7 @@
 #include "framework/base/container.h"
 
 #include "framework/base/exceptions.h"
+#include "platform/utf8.h"
 
 #include <algorithm>
 #include <bit>
@@ -30,13 +31,6 @@ template <std::size_t N> void bytesOf(std::uint32_t value, bool swapped, std::by
 {
     for (std::size_t i = 0; i < N; ++i)
         bytes[swapped ? N - 1 - i : i] = static_cast<std::byte>(value >> (8 * i));
-}
-
-/// Bytes of UTF-8 that begin a character.
-std::uint32_t characterCount(const std::string &text)
-{
-    return static_cast<std::uint32_t>(
-        std::count_if(text.begin(), text.end(), [](char c) { return (static_cast<unsigned char>(c) & 0xC0) != 0x80; }));
 }
 
 } // namespace
@@ -119,7 +113,7 @@ void CContainer::WriteString(const std::string &text)
     WriteU32(static_cast<std::uint32_t>(text.size()));
     if (text.empty())
         return;
-    WriteU32(characterCount(text));
+    WriteU32(static_cast<std::uint32_t>(Platform::characterCount(text)));
     WriteBytes(std::as_bytes(std::span(text)));
 }
 

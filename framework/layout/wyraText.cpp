@@ -1,7 +1,9 @@
 #include "framework/layout/wyraText.h"
 
 #include "framework/layout/layoutError.h"
+#include "platform/utf8.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace Sarnik
@@ -27,18 +29,9 @@ bool isNameStart(char c)
 
 std::pair<std::size_t, std::size_t> lineAndColumn(std::string_view text, std::size_t at)
 {
-    std::size_t line = 1, column = 1;
-    for (std::size_t i = 0; i < at && i < text.size(); ++i)
-    {
-        if (text[i] == '\n')
-        {
-            ++line;
-            column = 1;
-        }
-        else if ((static_cast<unsigned char>(text[i]) & 0xC0) != 0x80) // all but the later bytes of a UTF-8 character
-            ++column;
-    }
-    return {line, column};
+    const std::string_view before = text.substr(0, at), lastLine = before.substr(before.rfind('\n') + 1);
+    const auto lineEnds = static_cast<std::size_t>(std::count(before.begin(), before.end(), '\n'));
+    return {lineEnds + 1, Platform::characterCount(lastLine) + 1};
 }
 
 } // namespace

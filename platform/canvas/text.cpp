@@ -106,13 +106,7 @@ textBlock::layout::layout(std::string_view utf8, const font &f, const textOption
     const std::size_t most = mostBytes(size);
     text = cleanText(utf8.substr(0, most));
     if (text.size() > most)
-    {
-        // Cleaning made it longer. Cut between characters.
-        std::size_t end = most;
-        while (end > 0 && (static_cast<unsigned char>(text[end]) & 0xC0) == 0x80)
-            --end;
-        text.resize(end);
-    }
+        text.resize(characterStart(text, most)); // cleaning made it longer
 
     pango = pango_layout_new(textContext());
     PangoFontDescription *face = pango_font_description_new();
@@ -165,10 +159,7 @@ textBlock::layout::~layout()
 
 int textBlock::layout::index(std::size_t offset) const
 {
-    offset = std::min(offset, text.size());
-    while (offset > 0 && offset < text.size() && (static_cast<unsigned char>(text[offset]) & 0xC0) == 0x80)
-        --offset;
-    return static_cast<int>(offset);
+    return static_cast<int>(characterStart(text, offset));
 }
 
 textBlock::textBlock(std::string_view utf8, const font &f, const textOptions &options)

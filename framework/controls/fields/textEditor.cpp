@@ -13,16 +13,6 @@ namespace
 /// What may be undone: steps, and bytes in them.
 constexpr std::size_t mostSteps = 500, mostKept = 1'000'000;
 
-bool isTail(char byte)
-{
-    return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
-}
-
-std::size_t characterCount(std::string_view utf8)
-{
-    return static_cast<std::size_t>(std::count_if(utf8.begin(), utf8.end(), [](char c) { return !isTail(c); }));
-}
-
 enum class sort
 {
     space,
@@ -77,10 +67,7 @@ std::string CTextEditor::Cleaned(std::string_view utf8) const
 
 std::size_t CTextEditor::Snapped(std::size_t offset) const
 {
-    offset = std::min(offset, text.size());
-    while (offset > 0 && offset < text.size() && isTail(text[offset]))
-        --offset;
-    return offset;
+    return Platform::characterStart(text, offset);
 }
 
 void CTextEditor::CutToRules(std::string &incoming, std::size_t replacedBytes, std::size_t replacedCharacters) const
@@ -88,18 +75,12 @@ void CTextEditor::CutToRules(std::string &incoming, std::size_t replacedBytes, s
     std::size_t most = mostBytes - std::min(mostBytes, text.size() - replacedBytes);
     if (characters > 0)
     {
-        const std::size_t standing = characterCount(text) - replacedCharacters;
-        std::size_t left = characters - std::min(characters, standing), at = 0;
-        for (; at < incoming.size() && (left > 0 || isTail(incoming[at])); ++at)
-            if (!isTail(incoming[at]))
-                --left;
-        most = std::min(most, at);
+        const std::size_t standing = Platform::characterCount(text) - replacedCharacters;
+        const std::size_t left = characters - std::min(characters, standing);
+        most = std::min(most, Platform::bytesOfCharacters(incoming, left));
     }
-    if (incoming.size() <= most)
-        return;
-    while (most > 0 && isTail(incoming[most]))
-        --most;
-    incoming.resize(most);
+    if (incoming.size() > most)
+        incoming.resize(Platform::characterStart(incoming, most));
 }
 
 void CTextEditor::SetText(std::string_view utf8)
@@ -122,7 +103,7 @@ void CTextEditor::Select(std::size_t from, std::size_t to)
 bool CTextEditor::Insert(std::string_view utf8, change kind)
 {
     std::string incoming = Cleaned(utf8);
-    CutToRules(incoming, To() - From(), characterCount(Selected()));
+    CutToRules(incoming, To() - From(), Platform::characterCount(Selected()));
     if (incoming.empty() && !HasSelection())
         return false;
     Apply({From(), std::string(Selected()), std::move(incoming), anchor, caret, kind});

@@ -1,6 +1,9 @@
 #include "framework/controls/fields/textLines.h"
 
+#include "platform/utf8.h"
+
 #include <algorithm>
+#include <string_view>
 
 namespace Sarnik
 {
@@ -9,11 +12,6 @@ namespace
 
 constexpr std::string_view dot = "\xE2\x80\xA2";
 constexpr double farRight = 1e6;
-
-bool isTail(char byte)
-{
-    return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
-}
 
 } // namespace
 
@@ -26,9 +24,8 @@ void CTextLines::Set(const std::string &newText, const shape &newShape)
     made = true;
     std::string dots;
     if (form.dotted)
-        for (const char c : text)
-            if (!isTail(c))
-                dots += dot;
+        for (std::size_t n = Platform::characterCount(text); n > 0; --n)
+            dots += dot;
     pieces.Set(form.dotted ? dots : text, form.font,
                Platform::textOptions{.width = form.lines ? form.width : 0,
                                      .lines = form.lines,
@@ -39,19 +36,12 @@ std::size_t CTextLines::Shown(std::size_t offset) const
 {
     if (!form.dotted)
         return offset;
-    const auto end = text.begin() + static_cast<std::ptrdiff_t>(std::min(offset, text.size()));
-    return dot.size() * static_cast<std::size_t>(std::count_if(text.begin(), end, [](char c) { return !isTail(c); }));
+    return dot.size() * Platform::characterCount(std::string_view(text).substr(0, offset));
 }
 
 std::size_t CTextLines::FromShown(std::size_t offset) const
 {
-    if (!form.dotted)
-        return offset;
-    std::size_t left = offset / dot.size(), at = 0;
-    for (; at < text.size() && (left > 0 || isTail(text[at])); ++at)
-        if (!isTail(text[at]))
-            --left;
-    return at;
+    return form.dotted ? Platform::bytesOfCharacters(text, offset / dot.size()) : offset;
 }
 
 Platform::rectangle CTextLines::Caret(std::size_t offset) const

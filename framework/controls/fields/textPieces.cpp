@@ -1,5 +1,7 @@
 #include "framework/controls/fields/textPieces.h"
 
+#include "platform/utf8.h"
+
 #include <algorithm>
 #include <iterator>
 #include <string_view>
@@ -7,16 +9,6 @@
 
 namespace Sarnik
 {
-namespace
-{
-
-bool isTail(char byte)
-{
-    return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
-}
-
-} // namespace
-
 void CTextPieces::Set(const std::string &newText, const Platform::font &newFont,
                       const Platform::textOptions &newOptions)
 {
@@ -138,9 +130,7 @@ CTextPieces::piece CTextPieces::Piece(std::size_t start, std::size_t preferredEn
 /// The lines before the one in which the longest piece would end.
 CTextPieces::piece CTextPieces::BrokenPiece(std::size_t start)
 {
-    std::size_t end = start + limits.most;
-    while (isTail(text[end]))
-        --end;
+    std::size_t end = Platform::characterStart(text, start + limits.most);
     const Platform::textBlock tried = LayOut(start, end - start, edge::brokenLine).block;
     if (tried.lastLine() > 0)
         end = start + tried.lastLine();
