@@ -60,45 +60,34 @@ void CTipWatch::TimerFired(void *watch)
 
 void CTipWatch::Moved(CView *view, CPoint to)
 {
+    // The first who has one gives the tip, with its rectangle in the window, and the first who has one the help.
     CTip tip;
-    const CView *asked = view;
-    for (CView *from = view; from != nullptr && (tip.text.empty() || tip.help.empty()); from = from->ParentView())
-    {
-        CTip answer;
-        if (!from->GetTip(from->FromWindow(to), answer))
-            continue;
+    const auto missing = [&] { return tip.text.empty() || tip.help.empty(); };
+    const auto take = [&](CTip &answer, const CRect &inWindow) {
         if (tip.text.empty() && !answer.text.empty())
         {
             tip.text = std::move(answer.text);
-            tip.rect = answer.rect;
-            asked = from;
+            tip.rect = inWindow;
         }
         if (tip.help.empty())
             tip.help = std::move(answer.help);
-    }
-    if (CTip own; (tip.text.empty() || tip.help.empty()) && window.PointerInside() && window.GetTip(to, own))
-    {
-        if (tip.text.empty() && !own.text.empty())
-        {
-            tip.text = std::move(own.text);
-            tip.rect = own.rect;
-            asked = nullptr;
-        }
-        if (tip.help.empty())
-            tip.help = std::move(own.help);
-    }
+    };
+    for (CView *asked = view; asked != nullptr && missing(); asked = asked->ParentView())
+        if (CTip answer; asked->GetTip(asked->FromWindow(to), answer))
+            take(answer, asked->ToWindow(answer.rect));
+    if (CTip answer; missing() && window.PointerInside() && window.GetTip(to, answer))
+        take(answer, answer.rect);
 
     std::string newHelp = Localize(tip.help);
     if (newHelp != help)
         window.SetHelp(help = std::move(newHelp));
 
     at = to;
-    const CRect newRect = tip.text.empty() ? CRect{} : asked == nullptr ? tip.rect : asked->ToWindow(tip.rect);
-    if (tip.text != text || newRect != rect)
+    if (tip.text != text || tip.rect != rect)
     {
         Hide();
         text = std::move(tip.text);
-        rect = newRect;
+        rect = tip.rect;
         done = false;
     }
     // The delay counts from the last move.
