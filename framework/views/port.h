@@ -4,6 +4,8 @@
 #include "platform/canvas/canvas.h"
 
 #include <algorithm>
+#include <cmath>
+#include <cstdint>
 #include <span>
 
 namespace Sarnik
@@ -15,6 +17,13 @@ inline Platform::rectangle toCanvas(const CRect &r)
 {
     return {static_cast<double>(r.left), static_cast<double>(r.top), static_cast<double>(r.right),
             static_cast<double>(r.bottom)};
+}
+
+/// The whole units within.
+inline CRect wholeWithin(const Platform::rectangle &r)
+{
+    const auto whole = [](double v) { return CRect::Clamped(static_cast<std::int64_t>(v)); };
+    return {whole(std::ceil(r.left)), whole(std::ceil(r.top)), whole(std::floor(r.right)), whole(std::floor(r.bottom))};
 }
 
 /// What a view draws to: its own coordinates, clipped to what of it can be seen and has to be drawn.

@@ -182,12 +182,11 @@ CRect CWindow::LargestFrame(std::int32_t margin) const
 {
     const Platform::rectangle area = CApplication::Current()->Display().workArea();
     const Platform::rectangle border = IsOpen() ? screen->border() : Platform::rectangle{};
-    const auto in = [](double v) { return CRect::Clamped(std::llround(std::ceil(v))); };
-    const std::int32_t left = in(area.left + border.left + margin), top = in(area.top + border.top + margin);
-    const auto to = [](std::int32_t from, double v) {
-        return std::max(from + 1, CRect::Clamped(std::llround(std::floor(v))));
-    };
-    return {left, top, to(left, area.right - border.right - margin), to(top, area.bottom - border.bottom - margin)};
+    CRect frame = wholeWithin({area.left + border.left + margin, area.top + border.top + margin,
+                               area.right - border.right - margin, area.bottom - border.bottom - margin});
+    frame.right = std::max(frame.right, frame.left + 1);
+    frame.bottom = std::max(frame.bottom, frame.top + 1);
+    return frame;
 }
 
 /// The display says that the size or the scale is another one.

@@ -3,7 +3,6 @@
 #include "framework/views/application.h"
 
 #include <algorithm>
-#include <cmath>
 
 namespace Sarnik
 {
@@ -32,10 +31,7 @@ CPopup::CPopup(Platform::colour background)
 
 CRect CPopup::WorkArea()
 {
-    const Platform::rectangle area = CApplication::Current()->Display().workArea();
-    const auto whole = [](double v) { return CRect::Clamped(static_cast<std::int64_t>(v)); };
-    return {whole(std::ceil(area.left)), whole(std::ceil(area.top)), whole(std::floor(area.right)),
-            whole(std::floor(area.bottom))};
+    return wholeWithin(CApplication::Current()->Display().workArea());
 }
 
 void CPopup::OpenBy(CWindow &by, const CRect &anchor, std::int32_t width, std::int32_t height, std::int32_t least)
