@@ -42,11 +42,10 @@ void CEditString::ReplaceText(std::string_view utf8)
     scroll = {};
     if (HasFocus())
         Reveal();
-    else
+    else if (SeveralLines())
     {
-        // From the beginning.
-        if (SeveralLines())
-            editor.Select(0, 0);
+        // From the beginning. One line has no bar, and is laid out when it is drawn.
+        editor.Select(0, 0);
         ScrollTo({});
     }
     Grow();
