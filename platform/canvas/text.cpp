@@ -271,7 +271,7 @@ bool isCaretPlace(const PangoLogAttr &a)
     return a.is_cursor_position;
 }
 
-bool beginsWord(const PangoLogAttr &a)
+bool isWordStart(const PangoLogAttr &a)
 {
     return a.is_word_start;
 }
@@ -290,20 +290,18 @@ std::size_t textBlock::previousCharacter(std::size_t offset) const
 
 std::size_t textBlock::nextWord(std::size_t offset) const
 {
-    return seek(made->pango, made->text, made->index(offset), 1, beginsWord);
+    return seek(made->pango, made->text, made->index(offset), 1, isWordStart);
 }
 
 std::size_t textBlock::previousWord(std::size_t offset) const
 {
-    return seek(made->pango, made->text, made->index(offset), -1, beginsWord);
+    return seek(made->pango, made->text, made->index(offset), -1, isWordStart);
 }
 
-bool textBlock::isWordStart(std::size_t offset) const
+bool textBlock::beginsWithWord() const
 {
-    int count = 0;
-    const PangoLogAttr *const attributes = pango_layout_get_log_attrs_readonly(made->pango, &count);
-    const char *const begin = made->text.c_str();
-    return beginsWord(attributes[g_utf8_pointer_to_offset(begin, begin + made->index(offset))]);
+    int count = 0; // at least one: the end's
+    return isWordStart(*pango_layout_get_log_attrs_readonly(made->pango, &count));
 }
 
 } // namespace Platform

@@ -84,7 +84,7 @@ public:
     std::size_t previousCharacter(std::size_t offset) const;
     std::size_t nextWord(std::size_t offset) const;
     std::size_t previousWord(std::size_t offset) const;
-    bool isWordStart(std::size_t offset) const;
+    bool beginsWithWord() const;
 
 private:
     friend class canvas;

@@ -85,7 +85,7 @@ std::size_t CTextPieces::NextWord(std::size_t offset) const
     while (found >= p->length && std::next(p) != pieces.end())
     {
         ++p;
-        found = p->block.isWordStart(0) ? 0 : p->block.nextWord(0);
+        found = p->block.beginsWithWord() ? 0 : p->block.nextWord(0);
         if (found < p->length)
             break;
     }
@@ -98,7 +98,7 @@ std::size_t CTextPieces::PreviousWord(std::size_t offset) const
     for (std::size_t from = offset - p->start;; from = p->length)
     {
         const std::size_t found = from > 0 ? p->block.previousWord(from) : 0;
-        if (found > 0 || (from > 0 && p->block.isWordStart(0)) || p == pieces.begin())
+        if (found > 0 || (from > 0 && p->block.beginsWithWord()) || p == pieces.begin())
             return p->start + found;
         --p;
     }
