@@ -18,10 +18,13 @@ namespace
 std::string wordsIn(std::size_t bytes, std::size_t lines)
 {
     std::string text;
+    std::size_t line = 1;
     for (std::size_t word = 0; text.size() < bytes; ++word)
     {
         text.append(1 + word * 7 % 9, static_cast<char>('a' + word % 26));
-        text += text.size() * lines / bytes > (text.size() - 10) * lines / bytes && text.size() > 10 ? '\n' : ' ';
+        const bool full = text.size() >= bytes / lines * line;
+        text += full ? '\n' : ' ';
+        line += full ? 1 : 0;
     }
     text.resize(bytes);
     return text;
